@@ -1,0 +1,40 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+// The text rules every catalogue file follows. Files are bytes (ISO-8859-1); nothing is converted.
+// A line ends at CR (an LF right after it belongs to the line end) or at the end of the file.
+// A "file text" is the file's lines, each followed by CR LF.
+namespace catalogue {
+
+inline constexpr std::string_view kCrLf = "\r\n";
+
+// Splits file bytes into lines by the line rule. An empty file has no lines; a lone LF is data.
+std::vector<std::string_view> splitLines(std::string_view bytes);
+
+// The file text of some file bytes: every line followed by CR LF. For a file the program wrote,
+// this is byte for byte the file itself.
+std::string toFileText(std::string_view bytes);
+
+// The bytes to store for a text: unchanged when it ends with CR LF, otherwise followed by one
+// CR LF. The empty text stays empty.
+std::string forWriting(std::string_view text);
+
+// The first number in some bytes, read as a printed integer: leading blanks skipped, an optional
+// sign, digits. Nothing when the bytes do not start with a number.
+std::optional<long> firstNumber(std::string_view bytes);
+
+// Value of the digits at the start of a text after leading spaces (0 when none): how amounts
+// typed into a text box are read.
+long leadingNumber(std::string_view text);
+
+// An integer written into a file: a space for the sign, the digits, a space (" 1 ").
+std::string fileNumber(long value);
+
+// An integer written into a label or report: the sign place and digits (" 12", "-3").
+std::string labelNumber(long value);
+
+}  // namespace catalogue

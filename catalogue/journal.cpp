@@ -1,0 +1,105 @@
+#include "catalogue/journal.h"
+
+#include <charconv>
+#include <cstdint>
+
+namespace catalogue {
+
+namespace {
+
+constexpr std::string_view kHeader = "PEMLA-JOURNAL 1\n";
+
+std::uint64_t fnv1a(std::string_view bytes) {
+    std::uint64_t hash = 14695981039346656037ull;
+    for (unsigned char c : bytes) {
+        hash ^= c;
+        hash *= 1099511628211ull;
+    }
+    return hash;
+}
+
+void putName(std::string& out, std::string_view name) {
+    out.append(std::to_string(name.size())).push_back(':');
+    out.append(name);
+}
+
+// Reads "<length>:<bytes>" from the front of `in`.
+std::optional<std::string> takeName(std::string_view& in) {
+    std::size_t length = 0;
+    auto [end, ec] = std::from_chars(in.data(), in.data() + in.size(), length);
+    if (ec != std::errc() || end == in.data() || end == in.data() + in.size() || *end != ':') {
+        return std::nullopt;
+    }
+    in.remove_prefix(static_cast<std::size_t>(end - in.data()) + 1);
+    if (length > in.size() || length == 0) return std::nullopt;
+    std::string name(in.substr(0, length));
+    in.remove_prefix(length);
+    // Only plain names of the catalogue's own folder are ever journalled.
+    if (name.find_first_of(std::string_view("/\0", 2)) != std::string::npos || name == "." ||
+        name == "..") {
+        return std::nullopt;
+    }
+    return name;
+}
+
+bool take(std::string_view& in, std::string_view token) {
+    if (!in.starts_with(token)) return false;
+    in.remove_prefix(token.size());
+    return true;
+}
+
+}  // namespace
+
+std::string encodeJournal(const JournalPlan& plan) {
+    std::string out(kHeader);
+    for (const auto& [staged, target] : plan.renames) {
+        out.append("R ");
+        putName(out, staged);
+        out.push_back(' ');
+        putName(out, target);
+        out.push_back('\n');
+    }
+    for (const auto& target : plan.deletions) {
+        out.append("D ");
+        putName(out, target);
+        out.push_back('\n');
+    }
+    const std::uint64_t hash = fnv1a(out);
+    out.append("END ").append(std::to_string(hash)).push_back('\n');
+    return out;
+}
+
+std::optional<JournalPlan> decodeJournal(std::string_view bytes) {
+    const std::size_t endAt = bytes.rfind("END ");
+    if (endAt == std::string_view::npos || !bytes.ends_with('\n')) return std::nullopt;
+    const std::string_view body = bytes.substr(0, endAt);
+    std::string_view tail = bytes.substr(endAt + 4);
+    tail.remove_suffix(1);
+    std::uint64_t hash = 0;
+    auto [end, ec] = std::from_chars(tail.data(), tail.data() + tail.size(), hash);
+    if (ec != std::errc() || end != tail.data() + tail.size() || hash != fnv1a(body)) {
+        return std::nullopt;
+    }
+    std::string_view in = body;
+    if (!take(in, kHeader)) return std::nullopt;
+    JournalPlan plan;
+    while (!in.empty()) {
+        if (take(in, "R ")) {
+            auto staged = takeName(in);
+            if (!staged || !take(in, " ")) return std::nullopt;
+            auto target = takeName(in);
+            if (!target) return std::nullopt;
+            plan.renames.emplace_back(std::move(*staged), std::move(*target));
+        } else if (take(in, "D ")) {
+            auto target = takeName(in);
+            if (!target) return std::nullopt;
+            plan.deletions.push_back(std::move(*target));
+        } else {
+            return std::nullopt;
+        }
+        if (!take(in, "\n")) return std::nullopt;
+    }
+    return plan;
+}
+
+}  // namespace catalogue

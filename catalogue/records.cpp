@@ -1,0 +1,186 @@
+#include "catalogue/records.h"
+
+#include "catalogue/file_text.h"
+#include "catalogue/latin1.h"
+
+namespace catalogue {
+
+namespace {
+
+constexpr auto npos = std::string_view::npos;
+
+// The text after `tag` (found at or after `from`) up to the next CR; moves `from` to that CR.
+std::optional<std::string> fieldAfter(std::string_view text, std::string_view tag,
+                                      std::size_t& from) {
+    const std::size_t at = text.find(tag, from);
+    if (at == npos) return std::nullopt;
+    const std::size_t start = at + tag.size();
+    const std::size_t cr = text.find('\r', start);
+    if (cr == npos) return std::nullopt;
+    from = cr;
+    return std::string(text.substr(start, cr - start));
+}
+
+// Start and end (after its CR LF) of a line holding position `at`.
+std::size_t lineEnd(std::string_view text, std::size_t at) {
+    const std::size_t lf = text.find('\n', at);
+    return lf == npos ? text.size() : lf + 1;
+}
+
+// The span of an entry found at `at`: up to the next title line, or the end of the text.
+std::size_t entryEnd(std::string_view text, std::size_t at) {
+    const std::size_t next = text.find(kTitleTag, at + 1);
+    return next == npos ? text.size() : next;
+}
+
+}  // namespace
+
+std::string entryFile(std::string_view list) { return std::string(list) + ".dat"; }
+std::string articleFile(std::string_view list) { return std::string(list) + ".art"; }
+std::string counterFile(std::string_view list) { return std::string(list) + ".arn"; }
+std::string flagFile(std::string_view list) { return std::string(list) + ".inf"; }
+
+std::size_t findTitleLine(std::string_view entries, std::string_view title) {
+    std::string needle;
+    needle.reserve(title.size() + 4);
+    needle.append(kTitleTag).append(title).push_back('\r');
+    return findIgnoreCase(entries, needle);
+}
+
+std::optional<Entry> findEntry(std::string_view entries, std::string_view title) {
+    std::size_t pos = findTitleLine(entries, title);
+    if (pos == npos) return std::nullopt;
+    Entry entry;
+    entry.title = std::string(entries.substr(pos + kTitleTag.size(), title.size()));
+    auto type = fieldAfter(entries, kTypeTag, pos);
+    if (!type) return std::nullopt;
+    auto discs = fieldAfter(entries, kDiscsTag, pos);
+    if (!discs) return std::nullopt;
+    auto info = fieldAfter(entries, kInfoTag, pos);
+    if (!info) return std::nullopt;
+    entry.type = std::move(*type);
+    entry.discs = std::move(*discs);
+    entry.information = std::move(*info);
+    return entry;
+}
+
+std::string entryLines(const Entry& entry) {
+    std::string lines;
+    lines.reserve(entry.title.size() + entry.type.size() + entry.discs.size() +
+                  entry.information.size() + 20);
+    lines.append(kTitleTag).append(entry.title).append(kCrLf);
+    lines.append(kTypeTag).append(entry.type).append(kCrLf);
+    lines.append(kDiscsTag).append(entry.discs).append(kCrLf);
+    lines.append(kInfoTag).append(entry.information).append(kCrLf);
+    return lines;
+}
+
+std::string appendEntry(std::string_view entries, const Entry& entry) {
+    std::string text = forWriting(entries);
+    text.append(entryLines(entry));
+    return text;
+}
+
+std::optional<std::string> replaceEntry(std::string_view entries, std::string_view oldTitle,
+                                        const Entry& entry) {
+    const std::size_t at = findTitleLine(entries, oldTitle);
+    if (at == npos) return std::nullopt;
+    const std::size_t end = entryEnd(entries, at);
+    std::string text;
+    text.reserve(entries.size() + entry.title.size() + 64);
+    text.append(entries.substr(0, at));
+    text.append(entryLines(entry));
+    text.append(entries.substr(end));
+    return text;
+}
+
+std::optional<std::string> removeEntry(std::string_view entries, std::string_view title) {
+    const std::size_t at = findTitleLine(entries, title);
+    if (at == npos) return std::nullopt;
+    const std::size_t end = entryEnd(entries, at);
+    std::string text;
+    text.reserve(entries.size());
+    text.append(entries.substr(0, at));
+    text.append(entries.substr(end));
+    return text;
+}
+
+std::size_t findArticleLine(std::string_view articles, std::string_view title) {
+    std::size_t start = 0;
+    while (start < articles.size()) {
+        const std::size_t end = lineEnd(articles, start);
+        std::string_view line = articles.substr(start, end - start);
+        if (line.size() > title.size() + kArticleSeparator.size() &&
+            line.substr(title.size(), kArticleSeparator.size()) == kArticleSeparator &&
+            equalsIgnoreCase(line.substr(0, title.size()), title)) {
+            return start;
+        }
+        start = end;
+    }
+    return npos;
+}
+
+std::optional<std::string> findArticleNumber(std::string_view articles, std::string_view title) {
+    const std::size_t at = findArticleLine(articles, title);
+    if (at == npos) return std::nullopt;
+    const std::size_t numberAt = at + title.size() + kArticleSeparator.size();
+    const std::size_t cr = articles.find('\r', numberAt);
+    const std::size_t stop = cr == npos ? articles.size() : cr;
+    return std::string(articles.substr(numberAt, std::min<std::size_t>(4, stop - numberAt)));
+}
+
+std::string articleLine(std::string_view title, std::string_view number) {
+    std::string line;
+    line.reserve(title.size() + number.size() + 5);
+    line.append(title).append(kArticleSeparator).append(number).append(kCrLf);
+    return line;
+}
+
+std::optional<std::string> renameArticleLine(std::string_view articles, std::string_view oldTitle,
+                                             std::string_view newTitle) {
+    const std::size_t at = findArticleLine(articles, oldTitle);
+    if (at == npos) return std::nullopt;
+    std::string text;
+    text.reserve(articles.size() + newTitle.size());
+    text.append(articles.substr(0, at));
+    text.append(newTitle);
+    text.append(articles.substr(at + oldTitle.size()));
+    return text;
+}
+
+std::string removeArticleLine(std::string_view articles, std::string_view title) {
+    const std::size_t at = findArticleLine(articles, title);
+    if (at == npos) return std::string(articles);
+    std::string text(articles.substr(0, at));
+    text.append(articles.substr(lineEnd(articles, at)));
+    return text;
+}
+
+std::string removeIndexLine(std::string_view index, std::string_view name) {
+    std::size_t start = 0;
+    while (start < index.size()) {
+        const std::size_t end = lineEnd(index, start);
+        std::string_view line = index.substr(start, end - start);
+        if (line.ends_with(kCrLf)) line.remove_suffix(2);
+        if (equalsIgnoreCase(line, name)) {
+            std::string text(index.substr(0, start));
+            text.append(index.substr(end));
+            return text;
+        }
+        start = end;
+    }
+    return std::string(index);
+}
+
+std::string valueProblem(std::string_view value, bool isTitle) {
+    if (value.find_first_of("\r\n") != npos) return "a line break";
+    for (std::string_view tag : {kTitleTag, kTypeTag, kDiscsTag, kInfoTag}) {
+        if (value.find(tag) != npos) return "\"" + std::string(tag) + "\"";
+    }
+    if (isTitle && value.find(kArticleSeparator) != npos) {
+        return "\"" + std::string(kArticleSeparator) + "\"";
+    }
+    return {};
+}
+
+}  // namespace catalogue

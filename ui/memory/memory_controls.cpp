@@ -1,0 +1,181 @@
+#include "ui/memory/memory_controls.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <stdexcept>
+
+#include "catalogue/latin1.h"
+
+namespace ui::memory {
+
+namespace {
+
+const TextBox* focused = nullptr;
+
+bool lessItem(const std::string& a, const std::string& b) { return catalogue::itemLess(a, b); }
+
+}  // namespace
+
+void MemoryWindow::show() {
+    if (loaded_) {
+        bringToFront();
+        return;
+    }
+    loaded_ = true;
+    ++loadCount_;
+    if (onLoad) onLoad();
+}
+
+void MemoryWindow::unload() {
+    if (!loaded_) return;
+    ++unloadCount_;
+    if (onUnload) onUnload();
+    loaded_ = false;
+}
+
+bool MemoryButton::click() {
+    if (!acceptsInput()) return false;
+    if (onClick) onClick();
+    return true;
+}
+
+void MemoryListBox::addItem(const std::string& text) {
+    const auto at = std::upper_bound(items_.begin(), items_.end(), text, lessItem);
+    const int index = static_cast<int>(at - items_.begin());
+    items_.insert(at, text);
+    if (selected_ >= index) ++selected_;
+}
+
+void MemoryListBox::setItems(std::vector<std::string> items) {
+    std::stable_sort(items.begin(), items.end(), lessItem);
+    items_ = std::move(items);
+    selected_ = -1;
+}
+
+void MemoryListBox::clear() {
+    items_.clear();
+    selected_ = -1;
+}
+
+std::string MemoryListBox::itemText(int index) const {
+    if (index < 0 || index >= count()) throw std::out_of_range("list box index");
+    return items_[static_cast<std::size_t>(index)];
+}
+
+void MemoryListBox::setSelected(int index, bool selected) {
+    if (index < 0 || index >= count()) throw std::out_of_range("list box index");
+    if (selected) {
+        selected_ = index;
+    } else if (selected_ == index) {
+        selected_ = -1;
+    }
+}
+
+bool MemoryListBox::userSelect(int index) {
+    if (!acceptsInput() || index < 0 || index >= count()) return false;
+    if (selected_ == index) return true;
+    selected_ = index;
+    if (onClick) onClick();
+    return true;
+}
+
+bool MemoryListBox::userSelect(const std::string& text) {
+    const auto at = std::find(items_.begin(), items_.end(), text);
+    if (at == items_.end()) return false;
+    return userSelect(static_cast<int>(at - items_.begin()));
+}
+
+std::string MemoryComboBox::itemText(int index) const {
+    if (index < 0 || index >= itemCount()) throw std::out_of_range("combo box index");
+    return items_[static_cast<std::size_t>(index)];
+}
+
+bool MemoryComboBox::setText(const std::string& text) {
+    if (pickOnly_ && std::find(items_.begin(), items_.end(), text) == items_.end()) return false;
+    text_ = text;
+    return true;
+}
+
+void MemoryComboBox::type(const std::string& keys) {
+    if (!acceptsInput() || pickOnly_) return;
+    for (unsigned char c : keys) {
+        int key = c;
+        if (onKeyPress) onKeyPress(key);
+        if (key == 0) continue;
+        if (key == 8) {
+            if (!text_.empty()) text_.pop_back();
+        } else {
+            text_.push_back(static_cast<char>(key));
+        }
+    }
+}
+
+bool MemoryComboBox::userPick(int index) {
+    if (!acceptsInput() || index < 0 || index >= itemCount()) return false;
+    text_ = items_[static_cast<std::size_t>(index)];
+    return true;
+}
+
+void MemoryTextBox::setFocus() { focused = this; }
+
+bool MemoryTextBox::hasFocus() const { return focused == this; }
+
+void MemoryTextBox::type(const std::string& keys) {
+    if (!acceptsInput()) return;
+    for (char c : keys) {
+        if (c == '\b') {
+            if (!text_.empty()) text_.pop_back();
+        } else if (maxLength_ <= 0 || static_cast<int>(text_.size()) < maxLength_) {
+            text_.push_back(c);
+        }
+    }
+}
+
+bool MemoryCheckBox::userToggle() {
+    if (!acceptsInput()) return false;
+    value_ = value_ == 1 ? 0 : 1;
+    return true;
+}
+
+MemoryDriveList::MemoryDriveList(std::vector<std::string> drives) : drives_(std::move(drives)) {
+    if (!drives_.empty()) drive_ = drives_.front();
+}
+
+bool MemoryDriveList::setDrive(const std::string& drive) {
+    if (std::find(drives_.begin(), drives_.end(), drive) == drives_.end()) return false;
+    if (drive == drive_) return true;
+    drive_ = drive;
+    if (onChange) onChange();
+    return true;
+}
+
+bool MemoryDirList::setPath(const std::string& path) {
+    std::error_code ec;
+    if (path.empty() || !std::filesystem::is_directory(path, ec)) return false;
+    std::filesystem::directory_iterator probe(path, ec);
+    if (ec) return false;
+    std::string clean = path;
+    while (clean.size() > 1 && clean.ends_with('/')) clean.pop_back();
+    path_ = clean;
+    return true;
+}
+
+Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const std::string& title) {
+    shown_.push_back({prompt, title, style});
+    if (answers_.empty()) throw UnscriptedMessageBox{prompt, title, style};
+    const Answer next = answers_.front();
+    answers_.pop_front();
+    return next;
+}
+
+void MemoryPlatform::beginBusy() {
+    ++busyDepth_;
+    ++busyCount_;
+}
+
+void MemoryPlatform::endProgram(int status) {
+    ended_ = true;
+    endStatus_ = status;
+}
+
+}  // namespace ui::memory

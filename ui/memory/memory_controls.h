@@ -1,0 +1,219 @@
+#pragma once
+
+#include <deque>
+#include <string>
+#include <vector>
+
+#include "ui/controls.h"
+#include "ui/platform.h"
+
+// In-memory controls for tests. Besides the control interface, each offers what a user does with
+// it (click, type, select, close), and refuses it while the control or its window is disabled,
+// just as a real window takes no input then.
+namespace ui::memory {
+
+class MemoryWindow : public Window {
+public:
+    void show() override;
+    void unload() override;
+    bool isLoaded() const override { return loaded_; }
+    void setEnabled(bool enabled) override { enabled_ = enabled; }
+    bool isEnabled() const override { return enabled_; }
+    void bringToFront() override { ++frontCount_; }
+    void setCaption(const std::string& caption) override { caption_ = caption; }
+
+    // The user closes the window with its close box.
+    void userClose() { unload(); }
+    const std::string& caption() const { return caption_; }
+    int frontCount() const { return frontCount_; }
+    int loadCount() const { return loadCount_; }
+    int unloadCount() const { return unloadCount_; }
+
+private:
+    bool loaded_ = false;
+    bool enabled_ = true;
+    int frontCount_ = 0;
+    int loadCount_ = 0;
+    int unloadCount_ = 0;
+    std::string caption_;
+};
+
+// Base of the controls that sit on a window: input is refused while either is disabled.
+class Owned {
+public:
+    void setOwner(const MemoryWindow* owner) { owner_ = owner; }
+    bool acceptsInput() const { return ownEnabled_ && (owner_ == nullptr || owner_->isEnabled()); }
+
+protected:
+    const MemoryWindow* owner_ = nullptr;
+    bool ownEnabled_ = true;
+};
+
+class MemoryButton : public Button, public Owned {
+public:
+    void setCaption(const std::string& caption) override { caption_ = caption; }
+    void setEnabled(bool enabled) override { ownEnabled_ = enabled; }
+    const std::string& caption() const { return caption_; }
+    // The user presses the button; false when it takes no input.
+    bool click();
+
+private:
+    std::string caption_;
+};
+
+class MemoryLabel : public Label {
+public:
+    void setCaption(const std::string& caption) override { caption_ = caption; }
+    std::string caption() const override { return caption_; }
+
+private:
+    std::string caption_;
+};
+
+class MemoryListBox : public ListBox, public Owned {
+public:
+    void addItem(const std::string& text) override;
+    void setItems(std::vector<std::string> items) override;
+    void clear() override;
+    int count() const override { return static_cast<int>(items_.size()); }
+    std::string itemText(int index) const override;
+    bool selected(int index) const override { return index == selected_; }
+    void setSelected(int index, bool selected) override;
+    void refresh() override { ++refreshCount_; }
+
+    // The user selects an item; fires onClick when the selection changes.
+    bool userSelect(int index);
+    // The user selects the item with this text.
+    bool userSelect(const std::string& text);
+    int selectedIndex() const { return selected_; }
+    const std::vector<std::string>& items() const { return items_; }
+    int refreshCount() const { return refreshCount_; }
+
+private:
+    std::vector<std::string> items_;
+    int selected_ = -1;
+    int refreshCount_ = 0;
+};
+
+class MemoryComboBox : public ComboBox, public Owned {
+public:
+    explicit MemoryComboBox(bool pickOnly = false) : pickOnly_(pickOnly) {}
+    void addItem(const std::string& text) override { items_.push_back(text); }
+    void setItems(std::vector<std::string> items) override { items_ = std::move(items); }
+    int itemCount() const override { return static_cast<int>(items_.size()); }
+    std::string itemText(int index) const override;
+    std::string text() const override { return text_; }
+    bool setText(const std::string& text) override;
+    void setEnabled(bool enabled) override { ownEnabled_ = enabled; }
+    bool isEnabled() const override { return ownEnabled_; }
+
+    // The user types these characters one by one, each through onKeyPress ('\b' deletes).
+    void type(const std::string& keys);
+    // The user picks an item from the drop-down list.
+    bool userPick(int index);
+
+private:
+    bool pickOnly_;
+    std::vector<std::string> items_;
+    std::string text_;
+};
+
+class MemoryTextBox : public TextBox, public Owned {
+public:
+    std::string text() const override { return text_; }
+    void setText(const std::string& text) override { text_ = text; }
+    int maxLength() const override { return maxLength_; }
+    void setMaxLength(int length) override { maxLength_ = length; }
+    void setFocus() override;
+    bool hasFocus() const override;
+
+    // The user types these characters; those beyond the maximum length are refused.
+    void type(const std::string& keys);
+
+private:
+    std::string text_;
+    int maxLength_ = 0;
+};
+
+class MemoryCheckBox : public CheckBox, public Owned {
+public:
+    void setCaption(const std::string& caption) override { caption_ = caption; }
+    int value() const override { return value_; }
+    void setValue(int value) override { value_ = value; }
+    // The user clicks the box: set becomes clear, anything else set.
+    bool userToggle();
+    const std::string& caption() const { return caption_; }
+
+private:
+    std::string caption_;
+    int value_ = 0;
+};
+
+class MemoryDriveList : public DriveList, public Owned {
+public:
+    explicit MemoryDriveList(std::vector<std::string> drives = {"/"});
+    std::vector<std::string> drives() const override { return drives_; }
+    std::string drive() const override { return drive_; }
+    bool setDrive(const std::string& drive) override;
+
+private:
+    std::vector<std::string> drives_;
+    std::string drive_;
+};
+
+// Follows the real file system: a path is accepted when it names a readable folder.
+class MemoryDirList : public DirList, public Owned {
+public:
+    std::string path() const override { return path_; }
+    bool setPath(const std::string& path) override;
+
+private:
+    std::string path_ = "/";
+};
+
+// A message box that a test did not script. Deliberately not a std::exception, so that no
+// handler guard can swallow it: the test fails.
+struct UnscriptedMessageBox {
+    std::string prompt;
+    std::string title;
+    int style;
+};
+
+class MemoryPlatform : public Platform {
+public:
+    struct Shown {
+        std::string prompt;
+        std::string title;
+        int style;
+    };
+
+    // Scripts the answer to the next message box.
+    void answer(Answer next) { answers_.push_back(next); }
+    Answer messageBox(const std::string& prompt, int style, const std::string& title) override;
+    void beep() override { ++beeps_; }
+    std::string shortDate() override { return date_; }
+    void beginBusy() override;
+    void endBusy() override { --busyDepth_; }
+    void endProgram(int status) override;
+
+    void setDate(const std::string& date) { date_ = date; }
+    const std::vector<Shown>& shown() const { return shown_; }
+    int beeps() const { return beeps_; }
+    int busyDepth() const { return busyDepth_; }
+    int busyCount() const { return busyCount_; }
+    bool ended() const { return ended_; }
+    int endStatus() const { return endStatus_; }
+    std::size_t unansweredCount() const { return answers_.size(); }
+
+private:
+    std::deque<Answer> answers_;
+    std::vector<Shown> shown_;
+    std::string date_ = "06.12.2026";
+    int beeps_ = 0;
+    int busyDepth_ = 0;
+    int busyCount_ = 0;
+    bool ended_ = false;
+    int endStatus_ = 0;
+};
+
+}  // namespace ui::memory
