@@ -28,9 +28,9 @@ void MemoryWindow::show() {
 
 void MemoryWindow::unload() {
     if (!loaded_) return;
+    loaded_ = false;  // an unload handler that closes the window again must not run twice
     ++unloadCount_;
     if (onUnload) onUnload();
-    loaded_ = false;
 }
 
 bool MemoryButton::click() {
