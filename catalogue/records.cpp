@@ -21,10 +21,11 @@ std::optional<std::string> fieldAfter(std::string_view text, std::string_view ta
     return std::string(text.substr(start, cr - start));
 }
 
-// Start and end (after its CR LF) of a line holding position `at`.
+// End of the line starting at `at`, past its CR LF. Lines end at CR only: a lone LF is data.
 std::size_t lineEnd(std::string_view text, std::size_t at) {
-    const std::size_t lf = text.find('\n', at);
-    return lf == npos ? text.size() : lf + 1;
+    const std::size_t cr = text.find('\r', at);
+    if (cr == npos) return text.size();
+    return cr + 1 < text.size() && text[cr + 1] == '\n' ? cr + 2 : cr + 1;
 }
 
 // The span of an entry found at `at`: up to the next title line, or the end of the text.
