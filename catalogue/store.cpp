@@ -175,12 +175,9 @@ void Store::apply(const std::vector<std::pair<std::string, std::string>>& rename
 void Store::recover() {
     const std::string journal(kJournalName);
     if (exists(journal)) {
-        std::optional<JournalPlan> plan;
-        try {
-            plan = decodeJournal(readBytes(journal));
-        } catch (const CatalogueError&) {
-            plan.reset();
-        }
+        // A journal that cannot be read now may still be complete: the error goes up and the
+        // journal stays, since dropping it could leave a half-applied change for good.
+        const std::optional<JournalPlan> plan = decodeJournal(readBytes(journal));
         if (plan) {
             apply(plan->renames, plan->deletions);
         } else if (sys_.unlink(path(journal)) != 0 && errno != ENOENT) {
@@ -244,7 +241,13 @@ void Transaction::commit() {
         } else if (s.sys_.unlink(s.path(plan.front().name)) != 0 && errno != ENOENT) {
             throw osError(plan.front().name, errno);
         }
-        s.syncFolder();
+        // The change is made now and cannot be taken back, so a failed folder flush is retried
+        // once rather than reported as a change that did not happen.
+        try {
+            s.syncFolder();
+        } catch (const CatalogueError&) {
+            s.syncFolder();
+        }
         return;
     }
 
