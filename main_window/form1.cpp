@@ -41,6 +41,16 @@ Form1::Form1(const Form1Controls& controls, ui::Platform& platform, catalogue::S
     c_.Command_export.onClick = [this] { Command_export_Click(); };
     c_.Command_search.onClick = [this] { Command_search_Click(); };
     c_.Command_print.onClick = [this] { Command_print_Click(); };
+    c_.List_list.onClick = [this] { List_list_Click(); };
+    c_.List1.onClick = [this] { List1_Click(); };
+    c_.Command_clear.onClick = [this] { Command_clear_Click(); };
+    c_.Combo1.onKeyPress = [this](int& key) { Combo1_KeyPress(key); };
+    c_.Combo2.onKeyPress = [this](int& key) { Combo2_KeyPress(key); };
+    c_.Combo3.onKeyPress = [this](int& key) { Combo3_KeyPress(key); };
+    c_.Command_add.onClick = [this] { Command_add_Click(); };
+    c_.Command_change.onClick = [this] { Command_change_Click(); };
+    c_.Command_delentry.onClick = [this] { Command_delentry_Click(); };
+    c_.Command_delete.onClick = [this] { Command_delete_Click(); };
 }
 
 void Form1::Form_Load() {
@@ -74,6 +84,7 @@ void Form1::Form_Unload() {
 }
 
 void Form1::LoadListNames() {
+    wholeList_.clear();
     c_.List_list.clear();
     c_.List1.clear();
     c_.List_list.setItems(store_.readLines("pemla.dat"));
@@ -116,6 +127,8 @@ void Form1::guarded(const std::function<void()>& body) {
         body();
     } catch (const CatalogueError& error) {
         showError(error.file(), error.reason());
+    } catch (const Refusal& refusal) {
+        platform_.messageBox(refusal.prompt, 16, "Error");
     }
 }
 

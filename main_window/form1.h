@@ -1,8 +1,10 @@
 #pragma once
 
 #include <functional>
+#include <optional>
 #include <string>
 
+#include "catalogue/records.h"
 #include "catalogue/store.h"
 #include "ui/controls.h"
 #include "ui/platform.h"
@@ -70,11 +72,42 @@ public:
     void Command_search_Click();
     void Command_print_Click();
 
+    // Opening a list: List_list's click loads the selected list.
+    void List_list_Click();
+    // Reads a list's entry and flag files into ListText, EntryCount, List1 and Label2, and sets
+    // up the title length and the information box. Throws CatalogueError; the list is then
+    // shown empty and its entry file is not written until it loads whole.
+    void LoadEntries(const std::string& name);
+
+    // Selecting an entry fills the entry fields and its article number.
+    void List1_Click();
+    void ResetEntryFields();
+    void Command_clear_Click() { ResetEntryFields(); }
+    void Combo1_KeyPress(int& key) { limitTyping(c_.Combo1, 17, key); }
+    void Combo2_KeyPress(int& key) { limitTyping(c_.Combo2, 6, key); }
+    void Combo3_KeyPress(int& key) { limitTyping(c_.Combo3, 16, key); }
+
+    void Command_add_Click();
+    void Command_change_Click();
+    void Command_delentry_Click();
+    void Command_delete_Click();
+
+    // Plans the next article number for a title's first character in the list's counter file
+    // and sets ArticleNumber. Refuses (nothing planned) when the letter's numbers are used up.
+    void NextArticleNumber(char firstCharacter, const std::string& list, catalogue::Transaction& t);
+    // Plans the empty-list skeleton for a list's entry, article and counter files.
+    static void WriteEmptyList(const std::string& name, catalogue::Transaction& t);
+
     // The selected list's name, or an empty text when none is selected.
     std::string selectedList() const;
 
+    // A refusal the user is told about in a message box (title "Error", style 16).
+    struct Refusal {
+        std::string prompt;
+    };
+
     // Runs a handler body; a catalogue failure is shown as a message naming the file and the
-    // reason, and the window stays usable.
+    // reason, a Refusal as its prompt, and the window stays usable.
     void guarded(const std::function<void()>& body);
     // Shows a catalogue failure the way every handler does.
     void showError(const std::string& file, const std::string& reason);
@@ -86,6 +119,16 @@ public:
 
 private:
     void fillSuggestions(const std::string& file, ui::ComboBox& box);
+    void limitTyping(ui::ComboBox& box, std::size_t limit, int& key);
+    // The fields as an entry, refused when a value could not be stored safely.
+    catalogue::Entry fieldsAsEntry() const;
+    // The selected row of List1, or nothing.
+    std::optional<std::string> selectedTitle() const;
+    // Refuses to write `list`'s entry file unless ListText came whole from it.
+    void requireWholeList(const std::string& list) const;
+
+    // The list whose entry file ListText holds whole; empty after a failed or no load.
+    std::string wholeList_;
 
     Form1Controls c_;
     ui::Platform& platform_;

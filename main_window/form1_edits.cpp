@@ -1,0 +1,225 @@
+// Adding, changing and deleting entries, and deleting lists. Each operation plans all of its
+// files in one transaction, so they change together or not at all.
+#include "catalogue/article_numbers.h"
+#include "catalogue/catalogue_error.h"
+#include "catalogue/file_text.h"
+#include "catalogue/latin1.h"
+#include "catalogue/records.h"
+#include "main_window/form1.h"
+
+namespace main_window {
+
+using catalogue::CatalogueError;
+
+namespace {
+
+char upperFirst(const std::string& text) {
+    return text.empty() ? '\0' : static_cast<char>(catalogue::upperByte(
+                                     static_cast<unsigned char>(text.front())));
+}
+
+}  // namespace
+
+catalogue::Entry Form1::fieldsAsEntry() const {
+    catalogue::Entry entry{c_.Text1.text(), c_.Combo1.text(), c_.Combo2.text(), c_.Combo3.text()};
+    if (entry.title.empty()) throw Refusal{"Please type a title first."};
+    const std::pair<const char*, const std::string*> fields[] = {{"The title", &entry.title},
+                                                                 {"The type", &entry.type},
+                                                                 {"The number of discs", &entry.discs},
+                                                                 {"The information", &entry.information}};
+    for (const auto& [label, value] : fields) {
+        const std::string problem = catalogue::valueProblem(*value, value == &entry.title);
+        if (!problem.empty()) {
+            throw Refusal{std::string(label) + " cannot hold " + problem +
+                          ": the list's files use it to mark their records."};
+        }
+    }
+    return entry;
+}
+
+void Form1::requireWholeList(const std::string& list) const {
+    if (wholeList_ != list) {
+        throw Refusal{"The list \"" + list +
+                      "\" could not be read whole, so it is left unchanged. Open it again once "
+                      "its files are in order."};
+    }
+}
+
+void Form1::NextArticleNumber(char firstCharacter, const std::string& list,
+                              catalogue::Transaction& t) {
+    const std::string file = catalogue::counterFile(list);
+    const std::string counter = store_.readText(file);
+    const char letter = catalogue::articleLetter(firstCharacter);
+    switch (catalogue::counterProblem(counter, letter)) {
+        case catalogue::CounterProblem::Exhausted:
+            throw Refusal{std::string("Every article number of the letter ") + letter + " (" +
+                          letter + "001 to " + letter +
+                          "999) has been handed out in this list, so no other title that files "
+                          "under this letter can be stored in it."};
+        case catalogue::CounterProblem::Damaged:
+            throw CatalogueError(file, std::string("the record of the letter ") + letter +
+                                           " is damaged");
+        case catalogue::CounterProblem::None: break;
+    }
+    catalogue::ArticleNumberResult next = catalogue::nextArticleNumber(counter, firstCharacter);
+    t.write(file, next.counterText);
+    ArticleNumber = next.number;
+}
+
+void Form1::WriteEmptyList(const std::string& name, catalogue::Transaction& t) {
+    t.write(catalogue::entryFile(name), catalogue::kSkeletonEntries);
+    t.write(catalogue::articleFile(name), catalogue::kSkeletonArticles);
+    t.write(catalogue::counterFile(name), catalogue::kSkeletonCounter);
+}
+
+void Form1::Command_add_Click() {
+    guarded([&] {
+        const catalogue::Entry entry = fieldsAsEntry();
+        if (catalogue::findTitleLine(ListText, entry.title) != std::string::npos &&
+            entry.title != " ") {
+            platform_.messageBox("Title already exist, change name and try again!", 16, "Error");
+            return;
+        }
+        const std::string list = selectedList();
+        if (list.empty()) {
+            // No list to store it in: the fields are cleared and nothing is written.
+            ResetEntryFields();
+            return;
+        }
+        requireWholeList(list);
+        if (EntryCount >= catalogue::kMaxEntries) {
+            throw Refusal{"This list is full: a list holds at most 32767 titles."};
+        }
+        catalogue::Transaction t = store_.begin();
+        const std::string newText = catalogue::appendEntry(ListText, entry);
+        t.write(catalogue::entryFile(list), newText);
+        NextArticleNumber(entry.title.front(), list, t);
+        const std::string articleFile = catalogue::articleFile(list);
+        std::string articles = catalogue::forWriting(store_.readTextIfExists(articleFile).value_or(""));
+        articles += catalogue::articleLine(entry.title, ArticleNumber);
+        t.write(articleFile, articles);
+        t.commit();
+        ListText = newText;
+        LoadEntries(list);
+        ResetEntryFields();
+    });
+    c_.Text1.setFocus();
+}
+
+void Form1::Command_change_Click() {
+    const std::optional<std::string> oldTitle = selectedTitle();
+    if (!oldTitle) {
+        platform_.messageBox("Select the entry to change in the list first.", 16, "Error");
+        return;
+    }
+    guarded([&] {
+        const catalogue::Entry entry = fieldsAsEntry();
+        if (platform_.messageBox("Are ya sure yo want to change selected entry?", 4,
+                                 "Change item") != ui::Answer::Yes) {
+            ResetEntryFields();
+            return;
+        }
+        const std::string list = selectedList();
+        if (list.empty()) {
+            ResetEntryFields();
+            return;
+        }
+        requireWholeList(list);
+        std::optional<std::string> newText = catalogue::replaceEntry(ListText, *oldTitle, entry);
+        if (!newText) {
+            throw CatalogueError(catalogue::entryFile(list),
+                                 "the entry \"" + *oldTitle + "\" is not in the file");
+        }
+        catalogue::Transaction t = store_.begin();
+        const std::string articleFile = catalogue::articleFile(list);
+        const std::string articles = store_.readText(articleFile);
+        const bool hasLine = catalogue::findArticleLine(articles, *oldTitle) != std::string::npos;
+        if (entry.title != *oldTitle || !hasLine) {
+            if (!hasLine || upperFirst(entry.title) != upperFirst(*oldTitle)) {
+                NextArticleNumber(entry.title.front(), list, t);
+                std::string moved = catalogue::removeArticleLine(articles, *oldTitle);
+                moved += catalogue::articleLine(entry.title, ArticleNumber);
+                t.write(articleFile, moved);
+            } else {
+                t.write(articleFile, *catalogue::renameArticleLine(articles, *oldTitle, entry.title));
+            }
+        }
+        t.write(catalogue::entryFile(list), *newText);
+        t.commit();
+        ListText = *newText;
+        LoadEntries(list);
+        ResetEntryFields();
+    });
+}
+
+void Form1::Command_delentry_Click() {
+    const std::optional<std::string> title = selectedTitle();
+    if (!title) return;
+    if (platform_.messageBox("Are ya sure yo want to DELETE selected entry?", 260, "Change item") !=
+        ui::Answer::Yes) {
+        return;
+    }
+    const std::string list = selectedList();
+    if (list.empty()) {
+        ResetEntryFields();
+        return;
+    }
+    guarded([&] {
+        catalogue::Transaction t = store_.begin();
+        if (c_.List1.count() == 1) {
+            WriteEmptyList(list, t);
+            t.commit();
+            LoadEntries(list);
+            ResetEntryFields();
+            return;
+        }
+        requireWholeList(list);
+        std::optional<std::string> newText = catalogue::removeEntry(ListText, *title);
+        if (!newText) {
+            throw CatalogueError(catalogue::entryFile(list),
+                                 "the entry \"" + *title + "\" is not in the file");
+        }
+        t.write(catalogue::entryFile(list), *newText);
+        const std::string articleFile = catalogue::articleFile(list);
+        if (auto articles = store_.readTextIfExists(articleFile)) {
+            t.write(articleFile, catalogue::removeArticleLine(*articles, *title));
+        }
+        t.commit();
+        ListText = *newText;
+        // The fields keep the deleted entry's values, so it can be added back at once.
+        LoadEntries(list);
+    });
+}
+
+void Form1::Command_delete_Click() {
+    const std::string name = selectedList();
+    if (name.empty()) return;
+    if (platform_.messageBox("ARE YA SURE YA WANT TO DELETE THE SELECTED LIST?", 260, "DELETE?") !=
+            ui::Answer::Yes ||
+        platform_.messageBox("ARE YA REALLY SURE?", 308, "DELETE?") != ui::Answer::Yes) {
+        return;
+    }
+    guarded([&] {
+        catalogue::Transaction t = store_.begin();
+        std::string index = catalogue::forWriting(store_.readText("pemla.dat"));
+        // Files that are already missing are simply not there to delete.
+        for (const std::string& file :
+             {catalogue::entryFile(name), catalogue::counterFile(name),
+              catalogue::articleFile(name), catalogue::flagFile(name)}) {
+            t.remove(file);
+        }
+        if (c_.List_list.count() == 1) {
+            // The catalogue keeps one list: the placeholder list takes the last one's place.
+            // Planned after the deletions, so deleting the placeholder list itself renews it.
+            const std::string placeholder(catalogue::kPlaceholderList);
+            index += placeholder + "\r\n";
+            WriteEmptyList(placeholder, t);
+            t.write(catalogue::flagFile(placeholder), catalogue::fileNumber(1));
+        }
+        t.write("pemla.dat", catalogue::removeIndexLine(index, name));
+        t.commit();
+        LoadListNames();
+    });
+}
+
+}  // namespace main_window

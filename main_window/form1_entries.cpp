@@ -1,0 +1,102 @@
+// Opening a list and showing its entries in the main window.
+#include "catalogue/catalogue_error.h"
+#include "catalogue/file_text.h"
+#include "catalogue/records.h"
+#include "main_window/form1.h"
+
+namespace main_window {
+
+using catalogue::CatalogueError;
+
+void Form1::List_list_Click() {
+    c_.List1.clear();
+    ResetEntryFields();
+    ui::BusyPointer busy(platform_);
+    for (int i = 0; i < c_.List_list.count(); ++i) {
+        if (c_.List_list.selected(i)) {
+            const std::string name = c_.List_list.itemText(i);
+            guarded([&] { LoadEntries(name); });
+        }
+    }
+}
+
+void Form1::LoadEntries(const std::string& name) {
+    ListText.clear();
+    EntryCount = 0;
+    wholeList_.clear();
+    c_.List1.clear();
+    c_.Label2.setCaption(kNoAmount);
+
+    const std::string entryFile = catalogue::entryFile(name);
+    const std::string bytes = store_.readBytes(entryFile);
+
+    // Lists made by older copies may have no flag file; they have the information column.
+    const std::string flagFile = catalogue::flagFile(name);
+    const bool information = !store_.exists(flagFile) || store_.readNumber(flagFile) == 1;
+    c_.Text1.setMaxLength(information ? 26 : 42);
+    c_.Combo3.setEnabled(information);
+    c_.Combo3.setText(information ? "Info" : "  ");
+
+    const std::vector<std::string_view> lines = catalogue::splitLines(bytes);
+    if (lines.size() % 4 != 0) {
+        throw CatalogueError(entryFile, "the file ends inside an entry (" +
+                                            std::to_string(lines.size()) +
+                                            " lines, which is not four lines per entry)");
+    }
+    std::vector<std::string> titles;
+    titles.reserve(lines.size() / 4);
+    for (std::size_t i = 0; i < lines.size(); i += 4) {
+        const std::string_view first = lines[i];
+        titles.emplace_back(first.size() > 3 ? first.substr(3) : std::string_view());
+    }
+    ListText = catalogue::toFileText(bytes);
+    EntryCount = static_cast<int>(titles.size());
+    c_.List1.setItems(std::move(titles));
+    c_.Label2.setCaption("... amount: " + catalogue::labelNumber(EntryCount) + " ...");
+    wholeList_ = name;
+}
+
+void Form1::List1_Click() {
+    ui::BusyPointer busy(platform_);
+    c_.List_list.refresh();
+    const std::optional<std::string> title = selectedTitle();
+    if (!title) return;
+    c_.Text1.setText(*title);
+    if (const auto entry = catalogue::findEntry(ListText, *title)) {
+        c_.Combo1.setText(entry->type);
+        c_.Combo2.setText(entry->discs);
+        c_.Combo3.setText(entry->information);
+    }
+    const std::string list = selectedList();
+    if (list.empty()) return;
+    c_.Textart.setText("");
+    guarded([&] {
+        const std::string articles = store_.readText(catalogue::articleFile(list));
+        c_.Textart.setText(catalogue::findArticleNumber(articles, c_.Text1.text()).value_or(""));
+    });
+}
+
+void Form1::ResetEntryFields() {
+    c_.Text1.setText("");
+    c_.Combo1.setText("Select type");
+    c_.Combo2.setText("Disc(s)");
+    c_.Combo3.setText("Info");
+    c_.Textart.setText("");
+    for (int i = 0; i < c_.List1.count(); ++i) {
+        if (c_.List1.selected(i)) c_.List1.setSelected(i, false);
+    }
+}
+
+void Form1::limitTyping(ui::ComboBox& box, std::size_t limit, int& key) {
+    if (key != 8 && box.text().size() >= limit) key = 0;
+}
+
+std::optional<std::string> Form1::selectedTitle() const {
+    std::optional<std::string> title;
+    for (int i = 0; i < c_.List1.count(); ++i) {
+        if (c_.List1.selected(i)) title = c_.List1.itemText(i);
+    }
+    return title;
+}
+
+}  // namespace main_window
