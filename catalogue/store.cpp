@@ -293,7 +293,12 @@ void writeFileAtomically(const std::string& fullPath, std::string_view bytes, Sy
         sys.unlink(staged);
         throw osError(shown, err);
     }
-    syncDirectory(sys, folderOf(fullPath), folderOf(fullPath));
+    // The report is in place; a failed folder flush is tried once more before it is reported.
+    try {
+        syncDirectory(sys, folderOf(fullPath), folderOf(fullPath));
+    } catch (const CatalogueError&) {
+        syncDirectory(sys, folderOf(fullPath), folderOf(fullPath));
+    }
 }
 
 }  // namespace catalogue
