@@ -1,0 +1,186 @@
+// The real main window on Qt, driven through its widgets: what the memory tests prove of the
+// handlers holds when a user clicks and types.
+#include <gtest/gtest.h>
+
+#include <QComboBox>
+#include <QElapsedTimer>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QMessageBox>
+#include <QPushButton>
+#include <QTest>
+#include <iostream>
+
+#include "app/main_window_view.h"
+#include "catalogue/store.h"
+#include "main_window/form1.h"
+#include "tests/support/temp_folder.h"
+#include "ui/qt/qt_platform.h"
+
+namespace {
+
+struct QtMainWindow {
+    explicit QtMainWindow(const test_support::TempFolder& folder)
+        : store(folder.path()), form(view.controls(), platform, store) {}
+
+    void click(QPushButton* button) { QTest::mouseClick(button, Qt::LeftButton); }
+    void select(QListWidget* list, const QString& text) {
+        const auto found = list->findItems(text, Qt::MatchExactly);
+        ASSERT_EQ(found.size(), 1) << text.toStdString();
+        list->scrollToItem(found.front());
+        QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
+                          list->visualItemRect(found.front()).center());
+    }
+    void typeInto(QWidget* widget, const QString& text) {
+        widget->setFocus();
+        QTest::keyClicks(widget, text);
+    }
+
+    catalogue::Store store;
+    ui::qt::QtPlatform platform;
+    app::MainWindowView view;
+    main_window::Form1 form;
+};
+
+// Answers every Yes/No message box with `answer`.
+void answerAll(ui::Answer answer) {
+    ui::qt::QtPlatform::setAnswerHook([answer](QMessageBox& box) {
+        return box.button(QMessageBox::Yes) != nullptr ? answer : ui::Answer::Ok;
+    });
+}
+
+TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
+    test_support::TempFolder folder;
+    folder.put("type.dat", "Types\r\nMusic CD\r\nGame\r\n");
+    folder.put("information.dat", "Information\r\nOriginal\r\n");
+    folder.put("pemla.dat", "Music\r\n");
+    folder.put("Music.dat", "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n");
+    folder.put("Music.art", "Zebra#*\\Z001\r\n");
+    folder.put("Music.arn", "A#001\r\nZ#002\r\n");
+    folder.put("Music.inf", " 1 \r\n");
+
+    QtMainWindow w(folder);
+    w.view.controls().window.show();
+    ASSERT_FALSE(w.platform.ended());
+    EXPECT_EQ(w.view.widget()->windowTitle(), QStringLiteral("Pemla 0.90Beta"));
+    EXPECT_EQ(w.view.Combo1->count(), 2);
+
+    w.select(w.view.List_list, QStringLiteral("Music"));
+    EXPECT_EQ(w.view.List1->count(), 1);
+    EXPECT_EQ(w.view.Label2->text(), QStringLiteral("... amount:  1 ..."));
+
+    // Add "Abbey Road" of type Music CD, 2 discs.
+    w.typeInto(w.view.Text1, QStringLiteral("Abbey Road"));
+    w.view.Combo1->setCurrentIndex(0);
+    w.view.Combo2->lineEdit()->clear();
+    w.typeInto(w.view.Combo2, QStringLiteral("2"));
+    w.click(w.view.Command_add);
+    EXPECT_EQ(folder.get("Music.dat"),
+              "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n"
+              "<|?Abbey Road\r\n<|'Music CD\r\n<||2\r\n<|*Info\r\n");
+    EXPECT_EQ(folder.get("Music.art"), "Zebra#*\\Z001\r\nAbbey Road#*\\A001\r\n");
+    EXPECT_EQ(folder.get("Music.arn"), "A#002\r\nZ#002\r\n");
+    ASSERT_EQ(w.view.List1->count(), 2);
+    EXPECT_EQ(w.view.List1->item(0)->text(), QStringLiteral("Abbey Road"));
+    EXPECT_TRUE(w.view.Text1->text().isEmpty());
+
+    // Select it, change its discs, confirm.
+    answerAll(ui::Answer::Yes);
+    w.select(w.view.List1, QStringLiteral("Abbey Road"));
+    EXPECT_EQ(w.view.Textart->text(), QStringLiteral("A001"));
+    EXPECT_EQ(w.view.Combo2->currentText(), QStringLiteral("2"));
+    w.view.Combo2->lineEdit()->clear();
+    w.typeInto(w.view.Combo2, QStringLiteral("3"));
+    w.click(w.view.Command_change);
+    EXPECT_EQ(folder.get("Music.dat"),
+              "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n"
+              "<|?Abbey Road\r\n<|'Music CD\r\n<||3\r\n<|*Info\r\n");
+
+    // Delete Zebra.
+    w.select(w.view.List1, QStringLiteral("Zebra"));
+    w.click(w.view.Command_delentry);
+    EXPECT_EQ(folder.get("Music.dat"), "<|?Abbey Road\r\n<|'Music CD\r\n<||3\r\n<|*Info\r\n");
+    EXPECT_EQ(folder.get("Music.art"), "Abbey Road#*\\A001\r\n");
+    EXPECT_EQ(w.view.List1->count(), 1);
+    EXPECT_EQ(w.view.Text1->text(), QStringLiteral("Zebra"));  // the deleted entry stays shown
+    ui::qt::QtPlatform::setAnswerHook(nullptr);
+}
+
+TEST(MainWindowOnQt, TheLargestListOpensQuickly) {
+    test_support::TempFolder folder;
+    folder.put("type.dat", "Types\r\n");
+    folder.put("information.dat", "Information\r\n");
+    folder.put("pemla.dat", "Big\r\n");
+    std::string entries;
+    std::string articles;
+    for (int i = 0; i < 32767; ++i) {
+        const std::string title = std::string(1, static_cast<char>('A' + i % 26)) + " title " +
+                                  std::to_string(i * 7919 % 32767);
+        entries += "<|?" + title + "\r\n<|'DVD video\r\n<||2\r\n<|*Original\r\n";
+        articles += title + "#*\\" + title.substr(0, 1) + "001\r\n";
+    }
+    folder.put("Big.dat", entries);
+    folder.put("Big.art", articles);
+    folder.put("Big.arn", "A#001\r\n");
+    folder.put("Big.inf", " 1 \r\n");
+    QtMainWindow w(folder);
+    w.view.controls().window.show();
+    QElapsedTimer timer;
+    timer.start();
+    w.select(w.view.List_list, QStringLiteral("Big"));
+    const qint64 openMs = timer.elapsed();
+    ASSERT_EQ(w.view.List1->count(), 32767);
+    timer.restart();
+    w.select(w.view.List1, w.view.List1->item(20000)->text());
+    const qint64 selectMs = timer.elapsed();
+    std::cout << "32767 entries on Qt: open " << openMs << " ms, select " << selectMs << " ms\n";
+    // Generous bounds that still catch work growing with the square of the list.
+    EXPECT_LT(openMs, 3000);
+    EXPECT_LT(selectMs, 1000);
+}
+
+TEST(MainWindowOnQt, ComboBoxesStopTypingAtTheirLimits) {
+    test_support::TempFolder folder;
+    folder.put("type.dat", "Types\r\n");
+    folder.put("information.dat", "Information\r\n");
+    folder.put("pemla.dat", "");
+    QtMainWindow w(folder);
+    w.view.controls().window.show();
+    struct Case {
+        QComboBox* box;
+        int limit;
+    };
+    for (const Case& c : {Case{w.view.Combo1, 17}, Case{w.view.Combo2, 6}, Case{w.view.Combo3, 16}}) {
+        c.box->lineEdit()->clear();
+        w.typeInto(c.box, QString(30, QChar('x')));
+        EXPECT_EQ(c.box->currentText().size(), c.limit);
+        QTest::keyClick(c.box, Qt::Key_Backspace);
+        EXPECT_EQ(c.box->currentText().size(), c.limit - 1);
+    }
+}
+
+TEST(MainWindowOnQt, AMissingFileStopsTheStartWithAMessage) {
+    test_support::TempFolder folder;
+    folder.put("type.dat", "Types\r\n");
+    folder.put("pemla.dat", "");
+    std::vector<std::string> asked;
+    ui::qt::QtPlatform::setAnswerHook([&](QMessageBox& box) {
+        asked.push_back(box.text().toStdString());
+        return ui::Answer::Ok;
+    });
+    {
+        QtMainWindow w(folder);
+        w.view.controls().window.show();
+        EXPECT_TRUE(w.platform.ended());
+        EXPECT_EQ(w.platform.status(), 1);
+        EXPECT_FALSE(w.view.widget()->isVisible());
+    }
+    ui::qt::QtPlatform::setAnswerHook(nullptr);
+    ui::qt::QtWindow::setEnding(false);
+    ASSERT_EQ(asked.size(), 1u);
+    EXPECT_NE(asked[0].find("information.dat"), std::string::npos);
+    EXPECT_NE(asked[0].find(folder.path()), std::string::npos);
+}
+
+}  // namespace
