@@ -41,6 +41,18 @@ std::string articleFile(std::string_view list) { return std::string(list) + ".ar
 std::string counterFile(std::string_view list) { return std::string(list) + ".arn"; }
 std::string flagFile(std::string_view list) { return std::string(list) + ".inf"; }
 
+std::optional<std::vector<std::string>> entryTitles(std::string_view bytes) {
+    const std::vector<std::string_view> lines = splitLines(bytes);
+    if (lines.size() % 4 != 0) return std::nullopt;
+    std::vector<std::string> titles;
+    titles.reserve(lines.size() / 4);
+    for (std::size_t i = 0; i < lines.size(); i += 4) {
+        const std::string_view first = lines[i];
+        titles.emplace_back(first.size() > 3 ? first.substr(3) : std::string_view());
+    }
+    return titles;
+}
+
 std::size_t findTitleLine(std::string_view entries, std::string_view title) {
     std::string needle;
     needle.reserve(title.size() + 4);

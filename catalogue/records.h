@@ -4,6 +4,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 // Record formats of the list files and the lookups and edits made on their file texts.
 // An entry is four lines: "<|?" title, "<|'" type, "<||" discs, "<|*" information.
@@ -38,6 +39,10 @@ std::string entryFile(std::string_view list);
 std::string articleFile(std::string_view list);
 std::string counterFile(std::string_view list);
 std::string flagFile(std::string_view list);
+
+// The titles of an entry file's bytes, in file order: each entry's first line from its fourth
+// character on. Nothing when the file does not hold whole entries of four lines.
+std::optional<std::vector<std::string>> entryTitles(std::string_view bytes);
 
 // Position of the title line "<|?" + title + CR in an entry text, ignoring case; npos if none.
 std::size_t findTitleLine(std::string_view entries, std::string_view title);

@@ -37,21 +37,15 @@ void Form1::LoadEntries(const std::string& name) {
     c_.Combo3.setEnabled(information);
     c_.Combo3.setText(information ? "Info" : "  ");
 
-    const std::vector<std::string_view> lines = catalogue::splitLines(bytes);
-    if (lines.size() % 4 != 0) {
+    std::optional<std::vector<std::string>> titles = catalogue::entryTitles(bytes);
+    if (!titles) {
         throw CatalogueError(entryFile, "the file ends inside an entry (" +
-                                            std::to_string(lines.size()) +
+                                            std::to_string(catalogue::splitLines(bytes).size()) +
                                             " lines, which is not four lines per entry)");
     }
-    std::vector<std::string> titles;
-    titles.reserve(lines.size() / 4);
-    for (std::size_t i = 0; i < lines.size(); i += 4) {
-        const std::string_view first = lines[i];
-        titles.emplace_back(first.size() > 3 ? first.substr(3) : std::string_view());
-    }
     ListText = catalogue::toFileText(bytes);
-    EntryCount = static_cast<int>(titles.size());
-    c_.List1.setItems(std::move(titles));
+    EntryCount = static_cast<int>(titles->size());
+    c_.List1.setItems(std::move(*titles));
     c_.Label2.setCaption("... amount: " + catalogue::labelNumber(EntryCount) + " ...");
     wholeList_ = name;
 }
