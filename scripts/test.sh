@@ -23,6 +23,8 @@ build build-test -DCMAKE_BUILD_TYPE=RelWithDebInfo
 build build-asan -DCMAKE_BUILD_TYPE=Debug -DPEMLA_SANITIZE=ON
 
 status=0
+echo "== Fuzz targets (a few seconds each) =="
+"$root/scripts/fuzz.sh" "${PEMLA_FUZZ_SECONDS:-5}" || status=1
 echo "== Tests (sanitizers) =="
 ctest --test-dir "$root/build-asan" --output-on-failure -j "$jobs" >"$root/build-asan/ctest.log" 2>&1 ||
     status=1
