@@ -43,4 +43,26 @@ bool itemLess(std::string_view a, std::string_view b) {
     return a < b;
 }
 
+void sortItems(std::vector<std::string>& items) {
+    std::vector<std::string> folded(items.size());
+    for (std::size_t i = 0; i < items.size(); ++i) {
+        folded[i].resize(items[i].size());
+        std::transform(items[i].begin(), items[i].end(), folded[i].begin(), [](char c) {
+            return static_cast<char>(foldByte(static_cast<unsigned char>(c)));
+        });
+    }
+    std::vector<std::size_t> order(items.size());
+    for (std::size_t i = 0; i < order.size(); ++i) order[i] = i;
+    // Folded texts compare as unsigned bytes, like itemLess; a shorter prefix comes first.
+    std::sort(order.begin(), order.end(), [&](std::size_t a, std::size_t b) {
+        const int byFold = folded[a].compare(folded[b]);
+        if (byFold != 0) return byFold < 0;
+        return items[a] < items[b];
+    });
+    std::vector<std::string> sorted;
+    sorted.reserve(items.size());
+    for (std::size_t i : order) sorted.push_back(std::move(items[i]));
+    items = std::move(sorted);
+}
+
 }  // namespace catalogue

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <vector>
 
 // ISO-8859-1 case handling, in one place. Every lookup that ignores letter case goes through here.
 namespace catalogue {
@@ -28,5 +29,8 @@ std::size_t findIgnoreCase(std::string_view hay, std::string_view needle, std::s
 
 // Ordering used by every list box: case-insensitive, ties broken by byte value.
 bool itemLess(std::string_view a, std::string_view b);
+
+// Sorts items into the list-box order. Folds each item once, so long lists sort quickly.
+void sortItems(std::vector<std::string>& items);
 
 }  // namespace catalogue

@@ -51,6 +51,9 @@ struct MemoryBackend {
     void select(ListBox& box, int index) {
         static_cast<memory::MemoryListBox&>(box).userSelect(index);
     }
+    std::vector<std::string> displayed(ListBox& box) {
+        return static_cast<memory::MemoryListBox&>(box).items();
+    }
     void type(ComboBox& box, const std::string& keys) {
         static_cast<memory::MemoryComboBox&>(box).type(keys);
     }
@@ -104,6 +107,12 @@ struct QtBackend {
         return {};
     }
 
+    std::vector<std::string> displayed(ListBox& box) {
+        auto* widget = static_cast<QListWidget*>(widgetOf.at(&box));
+        std::vector<std::string> texts;
+        for (int i = 0; i < widget->count(); ++i) texts.push_back(qt::fromQt(widget->item(i)->text()));
+        return texts;
+    }
     void select(ListBox& box, int index) {
         auto* widget = static_cast<QListWidget*>(widgetOf.at(&box));
         const QRect where = widget->visualItemRect(widget->item(index));
@@ -147,6 +156,18 @@ TYPED_TEST(ControlContract, ListBoxKeepsOneOrderAndOneSelection) {
     for (int i = 0; i < list.count(); ++i) selectedCount += list.selected(i) ? 1 : 0;
     EXPECT_EQ(selectedCount, 1);
     EXPECT_TRUE(list.selected(4));
+
+    // Filled again with one item more and one less, as after an add or a delete: same order,
+    // nothing selected.
+    list.setItems({"z", "b", "ABD", "Abc", "abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9"});
+    list.setItems({"z", "b", "ABD", "Abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9", "c"});
+    seen.clear();
+    for (int i = 0; i < list.count(); ++i) seen.push_back(list.itemText(i));
+    const std::vector<std::string> expected{"aB", "Abc", "ABD", "b", "c", "new", "z",
+                                            "\xC9T\xC9", "\xE9t\xE9"};
+    EXPECT_EQ(seen, expected);
+    EXPECT_EQ(this->b.displayed(list), expected);
+    for (int i = 0; i < list.count(); ++i) EXPECT_FALSE(list.selected(i)) << i;
 }
 
 TYPED_TEST(ControlContract, ListBoxClickFiresForTheUserOnly) {

@@ -47,7 +47,7 @@ void MemoryListBox::addItem(const std::string& text) {
 }
 
 void MemoryListBox::setItems(std::vector<std::string> items) {
-    std::stable_sort(items.begin(), items.end(), lessItem);
+    catalogue::sortItems(items);
     items_ = std::move(items);
     selected_ = -1;
 }

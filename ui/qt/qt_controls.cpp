@@ -124,17 +124,58 @@ void QtListBox::addItem(const std::string& text) {
 }
 
 void QtListBox::setItems(std::vector<std::string> items) {
-    std::stable_sort(items.begin(), items.end(), lessItem);
-    items_ = std::move(items);
-    QStringList texts;
-    texts.reserve(static_cast<qsizetype>(items_.size()));
-    for (const auto& item : items_) texts.append(toQt(item));
+    catalogue::sortItems(items);
     byCode_ = true;
-    list_->setUpdatesEnabled(false);
-    list_->clear();
-    list_->addItems(texts);
-    list_->setUpdatesEnabled(true);
+    list_->clearSelection();
+    if (!applyFewChanges(items)) {
+        QStringList texts;
+        texts.reserve(static_cast<qsizetype>(items.size()));
+        for (const auto& item : items) texts.append(toQt(item));
+        list_->setUpdatesEnabled(false);
+        list_->clear();
+        list_->addItems(texts);
+        list_->setUpdatesEnabled(true);
+    }
+    items_ = std::move(items);
     byCode_ = false;
+}
+
+bool QtListBox::applyFewChanges(const std::vector<std::string>& items) {
+    // A list shown again after one entry was added, changed or deleted differs in a few rows;
+    // changing just those keeps a long list box from being rebuilt item by item.
+    constexpr std::size_t kMaxChanges = 16;
+    if (items_.empty()) return false;
+    const std::size_t gap = items.size() > items_.size() ? items.size() - items_.size()
+                                                          : items_.size() - items.size();
+    if (gap > kMaxChanges) return false;
+    struct Change {
+        int row;
+        const std::string* insert;  // nothing: remove the row
+    };
+    std::vector<Change> changes;
+    std::size_t i = 0;
+    std::size_t j = 0;
+    int row = 0;
+    while (i < items_.size() || j < items.size()) {
+        if (i < items_.size() && j < items.size() && items_[i] == items[j]) {
+            ++i, ++j, ++row;
+        } else if (j >= items.size() || (i < items_.size() && catalogue::itemLess(items_[i], items[j]))) {
+            changes.push_back({row, nullptr});
+            ++i;
+        } else {
+            changes.push_back({row, &items[j]});
+            ++j, ++row;
+        }
+        if (changes.size() > kMaxChanges) return false;
+    }
+    for (const Change& change : changes) {
+        if (change.insert != nullptr) {
+            list_->insertItem(change.row, toQt(*change.insert));
+        } else {
+            delete list_->takeItem(change.row);
+        }
+    }
+    return true;
 }
 
 void QtListBox::clear() {

@@ -90,6 +90,10 @@ public:
     void refresh() override;
 
 private:
+    // Brings the list box to `items` by inserting and removing a few rows; false when more
+    // would change and it is rebuilt instead.
+    bool applyFewChanges(const std::vector<std::string>& items);
+
     QListWidget* list_;
     std::vector<std::string> items_;
     bool byCode_ = false;

@@ -1,0 +1,174 @@
+// Times the main window's operations on generated lists against the floor: reading the list's
+// files and writing them once through the same atomic path. Prints one table.
+#include <benchmark/benchmark.h>
+#include <stdlib.h>
+
+#include <QApplication>
+#include <QListWidget>
+#include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <map>
+#include <memory>
+#include <sstream>
+
+#include "app/main_window_view.h"
+#include "bench/catalogue_maker.h"
+#include "bench/bench_world.h"
+#include "catalogue/store.h"
+#include "main_window/form1.h"
+#include "ui/qt/qt_platform.h"
+
+namespace bench {
+namespace {
+
+void BM_Floor(benchmark::State& state) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    for (auto _ : state) {
+        catalogue::Transaction t = w.store.begin();
+        for (const char* ext : {".dat", ".art", ".arn"}) {
+            const std::string name = w.list + ext;
+            t.write(name, w.store.readBytes(name));
+        }
+        t.commit();
+    }
+}
+
+void BM_Open(benchmark::State& state) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    for (auto _ : state) w.form->LoadEntries(w.list);
+}
+
+void BM_OpenQt(benchmark::State& state) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    catalogue::Store store(w.folder);
+    ui::qt::QtPlatform platform;
+    app::MainWindowView view;
+    main_window::Form1 form(view.controls(), platform, store);
+    for (auto _ : state) {
+        form.LoadEntries(w.list);
+        QApplication::processEvents();  // the list box lays out and paints its first rows
+    }
+    if (view.List1->count() != static_cast<int>(state.range(0))) state.SkipWithError("not filled");
+}
+
+void BM_Select(benchmark::State& state) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    w.form->LoadEntries(w.list);
+    int row = 0;
+    for (auto _ : state) {
+        row = (row + 7919) % w.view.List1.count();
+        w.view.List1.userSelect(row);
+    }
+}
+
+void BM_Add(benchmark::State& state) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    const std::size_t boxesBefore = w.platform.shown().size();
+    for (auto _ : state) {
+        state.PauseTiming();
+        w.restore();
+        w.view.Text1.setText("Benchmark title");
+        state.ResumeTiming();
+        w.view.Command_add.click();
+    }
+    if (w.platform.shown().size() != boxesBefore) state.SkipWithError("a message box was shown");
+}
+
+void change(benchmark::State& state, const char* newTitle) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    const std::size_t boxesBefore = w.platform.shown().size();
+    for (auto _ : state) {
+        state.PauseTiming();
+        w.restore();
+        w.view.List1.userSelect(w.view.List1.count() / 2);
+        w.view.Text1.setText(newTitle);
+        w.platform.answer(ui::Answer::Yes);
+        state.ResumeTiming();
+        w.view.Command_change.click();
+    }
+    if (w.platform.shown().size() - boxesBefore != static_cast<std::size_t>(state.iterations())) {
+        state.SkipWithError("unexpected message box");
+    }
+}
+
+void BM_ChangeSameLetter(benchmark::State& state) { change(state, "Moon Changed"); }
+void BM_ChangeNewLetter(benchmark::State& state) { change(state, "Benchmark changed"); }
+
+void BM_Delete(benchmark::State& state) {
+    World& w = World::get(static_cast<int>(state.range(0)));
+    for (auto _ : state) {
+        state.PauseTiming();
+        w.restore();
+        w.view.List1.userSelect(w.view.List1.count() / 3);
+        w.platform.answer(ui::Answer::Yes);
+        state.ResumeTiming();
+        w.view.Command_delentry.click();
+    }
+}
+
+constexpr int kSmall = 1000;
+constexpr int kLarge = 32767;
+
+BENCHMARK(BM_Floor)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_Open)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_OpenQt)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_Select)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+// A full list refuses another title, so adding is measured on a list one short of full.
+BENCHMARK(BM_Add)->Arg(kSmall)->Arg(kLarge - 1)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_ChangeSameLetter)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_ChangeNewLetter)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_Delete)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
+
+// Collects every result and prints one table with each row's ratio to the floor of its size.
+class TableReporter : public benchmark::BenchmarkReporter {
+public:
+    bool ReportContext(const Context&) override { return true; }
+    void ReportRuns(const std::vector<Run>& runs) override {
+        for (const Run& run : runs) {
+            if (run.error_occurred) {
+                std::printf("%s: %s\n", run.benchmark_name().c_str(), run.error_message.c_str());
+                continue;
+            }
+            rows_.push_back({run.run_name.function_name, run.run_name.args,
+                             run.GetAdjustedRealTime()});
+        }
+    }
+    void Finalize() override {
+        std::map<int, double> floor;
+        for (const Row& row : rows_) {
+            if (row.name == "BM_Floor") floor[size(row.args)] = row.ms;
+        }
+        std::printf("| operation | entries | time (ms) | x floor |\n|---|---:|---:|---:|\n");
+        for (const Row& row : rows_) {
+            const int entries = size(row.args);
+            const int floorSize = floor.count(entries) ? entries : entries + 1;
+            const double base = floor.count(floorSize) ? floor[floorSize] : 0;
+            std::printf("| %s | %d | %.2f | %.2f |\n", row.name.substr(3).c_str(), entries, row.ms,
+                        base > 0 ? row.ms / base : 0.0);
+        }
+    }
+
+private:
+    struct Row {
+        std::string name;
+        std::string args;
+        double ms;
+    };
+    static int size(const std::string& args) { return std::atoi(args.c_str()); }
+    std::vector<Row> rows_;
+};
+
+}  // namespace
+}  // namespace bench
+
+int main(int argc, char** argv) {
+    setenv("QT_QPA_PLATFORM", "offscreen", 0);
+    QApplication application(argc, argv);
+    benchmark::Initialize(&argc, argv);
+    bench::TableReporter table;
+    benchmark::RunSpecifiedBenchmarks(&table);
+    benchmark::Shutdown();
+    bench::World::clear();
+    return 0;
+}
