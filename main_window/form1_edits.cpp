@@ -186,8 +186,11 @@ void Form1::Command_delentry_Click() {
         }
         t.commit();
         ListText = *newText;
-        // The fields keep the deleted entry's values, so it can be added back at once.
+        // The fields keep the deleted entry's values, so it can be added back at once; loading
+        // sets up the information box, which would otherwise lose its value.
+        const std::string information = c_.Combo3.text();
         LoadEntries(list);
+        c_.Combo3.setText(information);
     });
 }
 
