@@ -1,0 +1,87 @@
+// A list at its largest: 32767 entries of about 100 bytes. The list is full, and opening,
+// selecting, adding, changing and deleting each stay well under a quarter of a second.
+#include <chrono>
+#include <cstdio>
+
+#include "tests/main_window/form1_test_fixture.h"
+
+namespace main_window_test {
+namespace {
+
+constexpr int kFull = 32767;
+
+std::string titleOf(int i) {
+    char title[32];
+    std::snprintf(title, sizeof title, "%c%05d Recording", 'A' + i % 26, i);
+    return title;
+}
+
+// Runs `action` and prints how long it took; in an optimised build it must stay well under
+// a quarter of a second.
+template <typename Action>
+void timed(const char* what, Action action) {
+    const auto start = std::chrono::steady_clock::now();
+    action();
+    const auto ms =
+        std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - start).count();
+    std::printf("[   TIME   ] %s with %d entries: %.1f ms\n", what, kFull, ms);
+#ifdef NDEBUG
+    EXPECT_LT(ms, 250.0) << what;
+#endif
+}
+
+TEST_F(Form1Test, AFullListRefusesAnAddAndEveryOperationOnItIsQuick) {
+    std::vector<Item> items;
+    std::vector<Art> art;
+    for (int i = 0; i < kFull; ++i) {
+        items.push_back({titleOf(i), "Music CD", std::to_string(i % 10 + 1),
+                         "Original pressing with booklet, sleeve notes and poster"});
+        art.push_back({titleOf(i), std::string(1, 'A' + i % 26) + "001"});
+    }
+    const std::string dat = entries(items);
+    ASSERT_GT(dat.size(), 95u * kFull);  // about 100 bytes an entry
+    putList("Big", dat, articles(art));
+    folder.put("pemla.dat", crlf({"Big"}));
+    start();
+
+    timed("open", [&] { open("Big"); });
+    ASSERT_EQ(view.List1.count(), kFull);
+    EXPECT_EQ(view.Label2.caption(), "... amount:  32767 ...");
+
+    Files before = snapshot();
+    fill({"One too many", "CD", "1", ""});
+    platform.answer(Answer::Ok);
+    view.Command_add.click();
+    expectBox(0, 16, "Error");
+    EXPECT_EQ(snapshot(), before);
+    EXPECT_EQ(view.Text1.text(), "One too many");
+
+    const int middle = kFull / 2;
+    timed("select", [&] { select(titleOf(middle)); });
+    EXPECT_EQ(view.Textart.text(), std::string(1, 'A' + middle % 26) + "001");
+    retype(view.Combo1, "Vinyl");
+    platform.answer(Answer::Yes);
+    timed("change", [&] { view.Command_change.click(); });
+    items[middle].type = "Vinyl";
+    EXPECT_EQ(folder.get("Big.dat"), entries(items));
+
+    select(titleOf(middle + 1));
+    platform.answer(Answer::Yes);
+    timed("delete", [&] { view.Command_delentry.click(); });
+    items.erase(items.begin() + middle + 1);
+    EXPECT_EQ(folder.get("Big.dat"), entries(items));
+    EXPECT_EQ(view.Label2.caption(), "... amount:  32766 ...");
+
+    fill({"Zz last one", "CD", "1", ""});
+    timed("add", [&] { view.Command_add.click(); });
+    items.push_back({"Zz last one", "CD", "1", ""});
+    const std::string written = folder.get("Big.dat");
+    EXPECT_EQ(written, entries(items));
+    expectTidy("Big.dat", written);
+    expectTidy("Big.art", folder.get("Big.art"));
+    EXPECT_EQ(view.Label2.caption(), "... amount:  32767 ...");
+    EXPECT_EQ(platform.shown().size(), 3u);
+}
+
+}  // namespace
+}  // namespace main_window_test

@@ -1,0 +1,138 @@
+// Start-up, the buttons that open dialogs or end the program, and closing the window.
+#include "tests/main_window/form1_test_fixture.h"
+
+namespace main_window_test {
+namespace {
+
+using ui::memory::MemoryWindow;
+
+Strings itemsOf(const ui::ComboBox& box) {
+    Strings items;
+    for (int i = 0; i < box.itemCount(); ++i) items.push_back(box.itemText(i));
+    return items;
+}
+
+TEST_F(Form1Test, StartUpFillsTheBoxesButNeverOffersASuggestionFilesFirstLine) {
+    folder.put("pemla.dat", crlf({"Rock", "Jazz", "ambient"}));
+    start();
+    EXPECT_EQ(itemsOf(view.Combo1), (Strings{"Music CD", "DVD video", "Game"}));
+    EXPECT_EQ(itemsOf(view.Combo3), (Strings{"Original", "Copy"}));
+    EXPECT_EQ(itemsOf(view.Combo2), (Strings{"1", "2", "3", "4", "5", "6", "7", "8", "9", "10"}));
+    EXPECT_EQ(view.List_list.items(), (Strings{"ambient", "Jazz", "Rock"}));
+    EXPECT_EQ(view.List_list.selectedIndex(), -1);
+    EXPECT_TRUE(titles().empty());
+    expectReset();
+    EXPECT_EQ(view.Label2.caption(), "... amount ...");
+    EXPECT_EQ(view.Text1.maxLength(), 26);
+    EXPECT_EQ(view.window.caption(), "Pemla 0.90Beta");
+    const std::string header = " Title" + std::string(62, ' ') + "Type" + std::string(41, ' ') +
+                               "CD's" + std::string(13, ' ') + "Information";
+    EXPECT_EQ(header.size(), 141u);
+    EXPECT_EQ(view.Label4.caption(), header);
+    EXPECT_TRUE(platform.shown().empty());
+    EXPECT_FALSE(platform.ended());
+}
+
+TEST_F(Form1Test, OneLineSuggestionFilesAndAnEmptyIndexStartWithEmptyBoxes) {
+    MemoryWindow search, exporter;
+    form->setDialogs({nullptr, &exporter, &search});
+    folder.put("type.dat", "Types\r\n");
+    folder.put("information.dat", "Information, no line end");
+    start();
+    EXPECT_EQ(view.Combo1.itemCount(), 0);
+    EXPECT_EQ(view.Combo3.itemCount(), 0);
+    EXPECT_EQ(view.Combo1.text(), "Select type");
+    EXPECT_EQ(view.Combo3.text(), "Info");
+    EXPECT_EQ(view.List_list.count(), 0);
+    EXPECT_FALSE(platform.ended());
+    view.Command_search.click();
+    view.Command_export.click();
+    EXPECT_EQ(platform.beeps(), 2);
+    EXPECT_FALSE(search.isLoaded());
+    EXPECT_FALSE(exporter.isLoaded());
+    EXPECT_TRUE(platform.shown().empty());
+}
+
+TEST_F(Form1Test, DialogsOpenOnlyOnceAListIsSelectedAndOpen) {
+    MemoryWindow newList, search, exporter;
+    form->setDialogs({&newList, &exporter, &search});
+    putRock({"Jazz"});
+    start();
+    view.Command_search.click();
+    view.Command_export.click();
+    EXPECT_EQ(platform.beeps(), 2);
+    open("Rock");
+    view.Command_search.click();
+    view.Command_export.click();
+    view.Command_create.click();
+    EXPECT_EQ(platform.beeps(), 2);
+    EXPECT_TRUE(search.isLoaded());
+    EXPECT_TRUE(exporter.isLoaded());
+    EXPECT_TRUE(newList.isLoaded());
+    EXPECT_TRUE(platform.shown().empty());
+}
+
+TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) {
+    const struct {
+        const char* file;
+        const char* bytes;  // nullptr: the file is missing
+    } cases[] = {{"type.dat", nullptr},
+                 {"information.dat", nullptr},
+                 {"pemla.dat", nullptr},
+                 {"type.dat", ""},
+                 {"information.dat", ""}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(std::string(c.file) + (c.bytes == nullptr ? " missing" : " empty"));
+        test_support::MainWindowFixture fresh;
+        if (c.bytes == nullptr) {
+            std::filesystem::remove(fresh.folder.file(c.file));
+        } else {
+            fresh.folder.put(c.file, c.bytes);
+        }
+        fresh.platform.answer(Answer::Ok);
+        fresh.start();
+        ASSERT_EQ(fresh.platform.shown().size(), 1u);
+        const auto& box = fresh.platform.shown().front();
+        EXPECT_EQ(box.style, 16);
+        EXPECT_NE(box.prompt.find(std::string("\"") + c.file + "\""), std::string::npos)
+            << box.prompt;
+        EXPECT_NE(box.prompt.find(fresh.folder.path()), std::string::npos) << box.prompt;
+        EXPECT_TRUE(fresh.platform.ended());
+        EXPECT_EQ(fresh.platform.endStatus(), 1);
+    }
+}
+
+class ClosingTest : public Form1Test {
+protected:
+    void SetUp() override {
+        form->setDialogs({&newList, &exporter, &search});
+        exporter.onUnload = [this] { unloaded.push_back("export"); };
+        newList.onUnload = [this] { unloaded.push_back("new list"); };
+        search.onUnload = [this] { unloaded.push_back("search"); };
+        start();
+        newList.show();
+        exporter.show();
+    }
+    MemoryWindow newList, exporter, search;
+    Strings unloaded;
+};
+
+TEST_F(ClosingTest, ExitEndsAtOnceWithoutUnloadingAnyDialog) {
+    view.Command_print.click();
+    EXPECT_TRUE(platform.ended());
+    EXPECT_EQ(platform.endStatus(), 0);
+    EXPECT_TRUE(unloaded.empty());
+    EXPECT_TRUE(exporter.isLoaded());
+}
+
+TEST_F(ClosingTest, ClosingTheWindowUnloadsTheExportDialogThenTheNewListDialog) {
+    view.window.userClose();
+    // The search dialog was never loaded, so it has nothing to unload.
+    EXPECT_EQ(unloaded, (Strings{"export", "new list"}));
+    EXPECT_FALSE(exporter.isLoaded());
+    EXPECT_FALSE(newList.isLoaded());
+    EXPECT_EQ(search.unloadCount(), 0);
+}
+
+}  // namespace
+}  // namespace main_window_test
