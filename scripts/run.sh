@@ -15,12 +15,5 @@ cmake -S "$root" -B "$root/build-release" -G Ninja -DCMAKE_BUILD_TYPE=Release \
     -DPEMLA_BUILD_TESTS=OFF >/dev/null
 cmake --build "$root/build-release" --target pemla -j "$(nproc)" >/dev/null
 
-data="${PEMLA_DATA:-${XDG_DATA_HOME:-$HOME/.local/share}/pemla}"
-mkdir -p "$data"
-for file in type.dat information.dat; do
-    [ -e "$data/$file" ] || cp "$root/data/$file" "$data/$file"
-done
-[ -e "$data/pemla.dat" ] || : >"$data/pemla.dat"
-
-cd "$data"
-exec "$root/build-release/app/pemla"
+# The launcher prepares the data folder and starts the program there.
+exec "$root/build-release/app/pemla-launcher"

@@ -56,6 +56,12 @@ void QtWindow::show() {
 
 void QtWindow::unload() {
     if (!loaded_) return;
+    if (widget_->isHidden()) {
+        // A hidden window gets no close event from close(), yet its unload still runs.
+        loaded_ = false;
+        if (onUnload) onUnload();
+        return;
+    }
     closingByCode_ = true;
     widget_->close();
     closingByCode_ = false;
