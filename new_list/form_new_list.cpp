@@ -71,6 +71,10 @@ void Form_new_list::createList() {
         platform_.messageBox(kNameInUse, 16, "Error");
         return;
     }
+    // List-box rows are counted in 16 bits, so the catalogue holds at most 32767 lists.
+    if (catalogue::splitLines(index).size() >= 32767) {
+        throw main_window::Form1::Refusal{"The catalogue is full: it holds at most 32767 lists."};
+    }
 
     // The index line and the four files appear together or not at all, so a failure never
     // leaves a listed name without its files.

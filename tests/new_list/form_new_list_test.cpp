@@ -179,6 +179,21 @@ TEST(NewListDialog, RefusesNamesInUseOrReservedWithoutTouchingAFile) {
     }
 }
 
+TEST(NewListDialog, AFullCatalogueTakesNoFurtherList) {
+    NewListDialog d;
+    std::string index;
+    for (int i = 0; i < 32767; ++i) index += "List " + std::to_string(i) + "\r\n";
+    d.f.folder.put("pemla.dat", index);
+    d.f.start();
+    const auto before = d.files();
+    d.f.platform.answer(Answer::Ok);
+    d.create("One more");
+    ASSERT_EQ(d.f.platform.shown().size(), 1u);
+    EXPECT_NE(d.f.platform.shown()[0].prompt.find("32767 lists"), std::string::npos);
+    EXPECT_EQ(d.files(), before);
+    d.expectClosed();
+}
+
 TEST(NewListDialog, AcceptsNamesThatOnlyBeginLikeAListOrHoldAReservedWord) {
     NewListDialog d;
     d.f.folder.put("pemla.dat", "Hard Rock\r\n");
