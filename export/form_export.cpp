@@ -1,0 +1,235 @@
+#include "export/form_export.h"
+
+#include <filesystem>
+#include <vector>
+
+#include "catalogue/catalogue_error.h"
+#include "catalogue/file_text.h"
+#include "catalogue/records.h"
+#include "export/html_page.h"
+#include "export/last_added.h"
+#include "export/report_table.h"
+
+namespace exporting {
+
+using catalogue::CatalogueError;
+
+namespace {
+
+// Enables the dialog again however the run ends.
+class DisabledWhileRunning {
+public:
+    explicit DisabledWhileRunning(ui::Window& window) : window_(window) {
+        window_.setEnabled(false);
+    }
+    ~DisabledWhileRunning() { window_.setEnabled(true); }
+    DisabledWhileRunning(const DisabledWhileRunning&) = delete;
+    DisabledWhileRunning& operator=(const DisabledWhileRunning&) = delete;
+
+private:
+    ui::Window& window_;
+};
+
+// The path used to find a folder's volume: links resolved where they exist.
+std::string resolved(const std::string& folder) {
+    std::error_code ec;
+    const std::filesystem::path real = std::filesystem::weakly_canonical(folder, ec);
+    return ec ? folder : real.string();
+}
+
+}  // namespace
+
+Form_Export::Form_Export(const Form_ExportControls& controls, ui::Platform& platform,
+                         catalogue::Store& store, main_window::Form1& form1)
+    : c_(controls), platform_(platform), store_(store), form1_(form1) {
+    c_.window.setCaption(kForm_ExportCaption);
+    c_.Label1.setCaption("Output path:");
+    c_.Command1.setCaption("Export");
+    c_.Command2.setCaption("Cancel");
+    c_.Checkart.setCaption("Include Article number");
+    c_.Checkhtml.setCaption("Save as HTML");
+    c_.Checkcounter.setCaption("Include counter");
+    c_.Checkdate.setCaption("Include date");
+    c_.Checkline.setCaption("Separate line");
+    c_.Check_lastadd.setCaption("Include last added on the list");
+    c_.Label2.setCaption("Amount of last added");
+    c_.Text2.setMaxLength(2);
+    c_.Text2.setText("10");
+    c_.Label3.setCaption("Add the last added list in");
+    c_.Combo1.setItems({"Top", "Bottom"});
+    c_.Check_noinfo.setCaption("Don't include information");
+
+    c_.window.onLoad = [this] { Form_Load(); };
+    c_.window.onUnload = [this] { Form_Unload(); };
+    c_.Command1.onClick = [this] { Command1_Click(); };
+    c_.Command2.onClick = [this] { Command2_Click(); };
+    c_.Drive1.onChange = [this] { Drive1_Change(); };
+}
+
+void Form_Export::Form_Load() {
+    form1_.controls().window.setEnabled(false);
+    LoadSettings();
+}
+
+void Form_Export::Form_Unload() {
+    form1_.guarded([this] { SaveSettings(); });
+    ui::Window& main = form1_.controls().window;
+    main.setEnabled(true);
+    main.bringToFront();
+}
+
+void Form_Export::Drive1_Change() {
+    if (restoringDrive_) return;
+    if (c_.Dir1.setPath(c_.Drive1.drive()) || loading_) return;
+    // An unreadable drive (no medium, no permission): stay where the folder list is.
+    platform_.beep();
+    restoringDrive_ = true;
+    c_.Drive1.setDrive(driveOf(c_.Drive1.drives(), resolved(c_.Dir1.path())));
+    restoringDrive_ = false;
+}
+
+std::string Form_Export::workingFolder() const {
+    std::error_code ec;
+    const std::filesystem::path folder = std::filesystem::absolute(store_.folder(), ec);
+    return ec ? store_.folder() : folder.lexically_normal().string();
+}
+
+void Form_Export::LoadSettings() {
+    if (loadSettingsFile()) return;
+    std::vector<std::string> defaults;
+    if (const std::string home = homeFolder(); !home.empty()) defaults.push_back(home);
+    defaults.push_back(workingFolder());
+    for (const std::string& folder : defaults) {
+        try {
+            catalogue::Transaction t = store_.begin();
+            t.write(kSettingsFile, defaultSettingsText(folder));
+            t.commit();
+        } catch (const CatalogueError&) {
+            break;  // the file cannot be replaced: the defaults go straight into the controls
+        }
+        if (loadSettingsFile()) return;
+    }
+    for (const std::string& folder : defaults) {
+        ExportSettings fallback;
+        fallback.folder = folder;
+        if (applySettings(fallback)) return;
+    }
+}
+
+bool Form_Export::loadSettingsFile() {
+    std::optional<ExportSettings> settings;
+    try {
+        if (!store_.exists(kSettingsFile)) return false;
+        settings = decodeSettings(store_.readBytes(kSettingsFile));
+    } catch (const CatalogueError&) {
+        return false;
+    }
+    return settings && applySettings(*settings);
+}
+
+bool Form_Export::applySettings(const ExportSettings& settings) {
+    if (!settings.folder.starts_with('/')) return false;
+    const std::string drive = driveOf(c_.Drive1.drives(), resolved(settings.folder));
+    if (drive.empty()) return false;
+    loading_ = true;
+    const bool driveSet = c_.Drive1.setDrive(drive);
+    loading_ = false;
+    if (!driveSet || !c_.Dir1.setPath(settings.folder)) return false;
+    ui::CheckBox* boxes[] = {&c_.Checkart,  &c_.Checkhtml, &c_.Checkcounter,
+                             &c_.Checkdate, &c_.Checkline, &c_.Check_lastadd};
+    for (std::size_t i = 0; i < settings.checks.size(); ++i) boxes[i]->setValue(settings.checks[i]);
+    c_.Text2.setText(settings.amount);
+    return c_.Combo1.setText(settings.position);
+}
+
+void Form_Export::SaveSettings() {
+    ExportSettings settings;
+    settings.folder = c_.Dir1.path();
+    settings.checks = {c_.Checkart.value(),  c_.Checkhtml.value(), c_.Checkcounter.value(),
+                       c_.Checkdate.value(), c_.Checkline.value(), c_.Check_lastadd.value()};
+    settings.amount = c_.Text2.text();
+    settings.position = c_.Combo1.text();
+    catalogue::Transaction t = store_.begin();
+    t.write(kSettingsFile, encodeSettings(settings));
+    t.commit();
+}
+
+std::string Form_Export::BuildReport(const std::string& list) {
+    const std::optional<long> flag = store_.readNumber(catalogue::flagFile(list));
+    if (flag == 1) c_.Check_noinfo.setValue(0);
+    if (flag == 0) c_.Check_noinfo.setValue(1);
+
+    const std::string entries = store_.readText(catalogue::entryFile(list));
+    const bool articleNumbers = c_.Checkart.value() == 1;
+    const std::string articles =
+        articleNumbers ? store_.readText(catalogue::articleFile(list)) : std::string();
+
+    const ui::ListBox& titlesBox = form1_.controls().List1;
+    std::vector<std::string> titles;
+    titles.reserve(static_cast<std::size_t>(titlesBox.count()));
+    for (int i = 0; i < titlesBox.count(); ++i) titles.push_back(titlesBox.itemText(i));
+
+    ReportOptions options;
+    options.articleNumbers = articleNumbers;
+    options.information = c_.Check_noinfo.value() != 1;
+    options.date = c_.Checkdate.value() == 1;
+    options.separatorLines = c_.Checkline.value() == 1;
+    options.counter = c_.Checkcounter.value() == 1;
+    const std::string date = options.date ? platform_.shortDate() : std::string();
+    std::string report = BuildReportTable(list, entries, articles, titles, options, date);
+
+    // The top text is optional: a file that is missing or cannot be read is simply left out.
+    try {
+        if (auto top = store_.readTextIfExists(list + ".top")) report.insert(0, *top);
+    } catch (const CatalogueError&) {
+    }
+
+    const std::string amount = c_.Text2.text();
+    const std::string position = c_.Combo1.text();
+    LastAddedRequest request;
+    request.include = c_.Check_lastadd.value() == 1;
+    request.amountText = amount;
+    request.position = position;
+    request.information = options.information;
+    request.titleCount = titles.size();
+    LastAddedResult withSection = BuildLastAdded(entries, std::move(report), request);
+    if (withSection.refused) {
+        c_.Check_lastadd.setValue(0);
+        platform_.messageBox(kTooManyLastAdded, 16, kTooManyLastAddedTitle);
+    }
+    report = std::move(withSection.report);
+
+    report.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
+    return report;
+}
+
+void Form_Export::RunExport() {
+    {
+        const DisabledWhileRunning disabled(c_.window);
+        const std::string list = form1_.selectedList();
+        if (list.empty()) {
+            platform_.beep();
+            return;
+        }
+        try {
+            const std::string report = BuildReport(list);
+            std::string folder = c_.Dir1.path();
+            if (!folder.ends_with('/')) folder.push_back('/');
+            c_.Text1.setText(folder);
+            const std::string out = c_.Text1.text();
+            if (c_.Checkhtml.value() == 1) {
+                catalogue::writeFileAtomically(out + list + ".html", HtmlPage(list, report),
+                                               store_.sys());
+            } else {
+                catalogue::writeFileAtomically(out + list + ".TXT", report + "\r\n", store_.sys());
+            }
+        } catch (const CatalogueError& error) {
+            c_.window.setEnabled(true);
+            form1_.showError(error.file(), error.reason());
+            return;
+        }
+    }
+    platform_.messageBox("Export done!", 64, "Done");
+}
+
+}  // namespace exporting

@@ -1,0 +1,91 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "catalogue/store.h"
+#include "export/export_settings.h"
+#include "main_window/form1.h"
+#include "ui/controls.h"
+#include "ui/platform.h"
+
+// The export dialog: output folder, report options, and the export run itself.
+namespace exporting {
+
+struct Form_ExportControls {
+    ui::Window& window;
+    ui::Label& Label1;
+    ui::DirList& Dir1;
+    ui::DriveList& Drive1;
+    ui::Button& Command1;
+    ui::Button& Command2;
+    ui::CheckBox& Checkart;
+    ui::CheckBox& Checkhtml;
+    ui::CheckBox& Checkcounter;
+    ui::CheckBox& Checkdate;
+    ui::CheckBox& Checkline;
+    ui::CheckBox& Check_lastadd;
+    ui::Label& Label2;
+    ui::TextBox& Text2;
+    ui::Label& Label3;
+    ui::ComboBox& Combo1;  // pick-only
+    ui::CheckBox& Check_noinfo;
+    ui::TextBox& Text1;
+};
+
+inline constexpr const char* kForm_ExportCaption = "Export list";
+// The last line of every report: 36 spaces and this text of 41 characters.
+inline constexpr std::string_view kCreditText = "Exported from the disc catalogue, v. 0.90";
+static_assert(kCreditText.size() == 41);
+
+class Form_Export {
+public:
+    // Sets the captions and initial texts and wires every event to its handler.
+    Form_Export(const Form_ExportControls& controls, ui::Platform& platform,
+                catalogue::Store& store, main_window::Form1& form1);
+
+    const Form_ExportControls& controls() const { return c_; }
+
+    // Opening: the main window is disabled and the settings are loaded.
+    void Form_Load();
+    // Every closing: the settings are saved, the main window enabled and brought to the front.
+    void Form_Unload();
+    // "Export".
+    void Command1_Click() { RunExport(); }
+    // "Cancel" closes the dialog, which saves the settings.
+    void Command2_Click() { c_.window.unload(); }
+    // A drive chosen (by the user or by loading) shows its root in Dir1. A drive that cannot be
+    // read is refused with a beep, and the drive of the current folder is chosen again.
+    void Drive1_Change();
+
+    // Builds the report of the list selected in the main window from its files and the options,
+    // and writes it as list name + ".TXT" or ".html" into Dir1's folder, atomically. A missing
+    // list file or a failed write is shown as a message naming the file; the dialog stays usable
+    // and an older report stays as it was. Without a selected list it only beeps.
+    void RunExport();
+
+    // Loads "export.dat" into the controls. Any failure writes the defaults file (the home folder,
+    // else the working folder) and loads that; it never reports and never loops.
+    void LoadSettings();
+    // Writes the controls' settings to "export.dat". Throws CatalogueError.
+    void SaveSettings();
+
+    // The whole report text of a list as RunExport writes it, without the file's closing CR LF.
+    // Sets Check_noinfo from the list's flag; may clear Check_lastadd and show its refusal.
+    // Throws CatalogueError when a list file is missing or unreadable.
+    std::string BuildReport(const std::string& list);
+
+private:
+    bool loadSettingsFile();
+    bool applySettings(const ExportSettings& settings);
+    std::string workingFolder() const;
+
+    Form_ExportControls c_;
+    ui::Platform& platform_;
+    catalogue::Store& store_;
+    main_window::Form1& form1_;
+    bool loading_ = false;
+    bool restoringDrive_ = false;
+};
+
+}  // namespace exporting

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+// The report table of an export: every title of the open list as one row of a table drawn in
+// ASCII characters, 78 characters wide, under a top border carrying the list's name.
+namespace exporting {
+
+// The dialog's check boxes that shape the table, each as "is it set".
+struct ReportOptions {
+    bool articleNumbers = false;  // Checkart: an "Art#" column first
+    bool information = false;     // Check_noinfo clear: an information column last
+    bool date = false;            // Checkdate: the date in the top border
+    bool separatorLines = false;  // Checkline: the header underline between rows
+    bool counter = false;         // Checkcounter: the number of titles in the bottom line
+};
+
+// Builds the table for `titles` (the main window's List1, in its order). Each title's type, discs
+// and information come from its entry in `entryText` (exact title match), its article number from
+// `articleText` (matched ignoring case); both texts are indexed once, so the work is linear. A
+// title without an entry gets empty cells, one without an article line a blank number. Never fails.
+std::string BuildReportTable(std::string_view listName, std::string_view entryText,
+                             std::string_view articleText, const std::vector<std::string>& titles,
+                             const ReportOptions& options, std::string_view dateText);
+
+// `text` cut to its first `width` characters when longer.
+std::string firstChars(std::string_view text, std::size_t width);
+
+// `text` with spaces appended up to `width` characters; a longer text stays whole.
+std::string padded(std::string_view text, std::size_t width);
+
+}  // namespace exporting

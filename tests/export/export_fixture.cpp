@@ -1,0 +1,80 @@
+#include "tests/export/export_fixture.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <fstream>
+#include <sstream>
+
+namespace export_test {
+
+std::string data(const std::string& name) {
+    std::ifstream in(std::string(PEMLA_EXPORT_DATA) + "/" + name, std::ios::binary);
+    if (!in) throw std::runtime_error("missing test data " + name);
+    std::ostringstream bytes;
+    bytes << in.rdbuf();
+    return bytes.str();
+}
+
+std::vector<std::string> tenTitles() {
+    return {"Alien", "amelie", "Blade Runner", "Casablanca",
+            "Heat",  "Star",   "Star Wars",    "The Lord of the Rings Trilogy",
+            "Wars",  "Zorro"};
+}
+
+std::vector<std::string> nineTitles() {
+    std::vector<std::string> titles = tenTitles();
+    titles.erase(titles.begin() + 3);
+    return titles;
+}
+
+MemoryFormExport::MemoryFormExport(std::vector<std::string> drives) : Drive1(std::move(drives)) {
+    for (ui::memory::Owned* control : std::initializer_list<ui::memory::Owned*>{
+             &Dir1, &Drive1, &Command1, &Command2, &Checkart, &Checkhtml, &Checkcounter, &Checkdate,
+             &Checkline, &Check_lastadd, &Text2, &Combo1, &Check_noinfo, &Text1}) {
+        control->setOwner(&window);
+    }
+}
+
+exporting::Form_ExportControls MemoryFormExport::controls() {
+    return {window,   Label1,    Dir1,         Drive1,    Command1,     Command2,
+            Checkart, Checkhtml, Checkcounter, Checkdate, Checkline,    Check_lastadd,
+            Label2,   Text2,     Label3,       Combo1,    Check_noinfo, Text1};
+}
+
+ExportFixture::ExportFixture(std::vector<std::string> drives)
+    : dialog(std::move(drives)), form(dialog.controls(), main.platform, main.store, *main.form) {
+    if (const char* old = std::getenv("HOME")) {
+        hadHome_ = true;
+        oldHome_ = old;
+    }
+    ::setenv("HOME", home.path().c_str(), 1);
+    main.form->setDialogs({nullptr, &dialog.window, nullptr});
+}
+
+ExportFixture::~ExportFixture() {
+    if (hadHome_) {
+        ::setenv("HOME", oldHome_.c_str(), 1);
+    } else {
+        ::unsetenv("HOME");
+    }
+}
+
+void ExportFixture::openMovies(const std::string& flag) {
+    main.putList("Movies", data("movies.dat"), data("movies.art"), "A#003\r\n", flag);
+    main.folder.put("pemla.dat", "Movies\r\n");
+    main.start();
+    main.open("Movies");
+}
+
+void ExportFixture::openDialog() {
+    ASSERT_TRUE(main.view.Command_export.click());
+}
+
+std::string ExportFixture::settings(const std::vector<std::string>& lines) {
+    std::string text;
+    for (const std::string& line : lines) text += line + "\r\n";
+    return text;
+}
+
+}  // namespace export_test
