@@ -50,6 +50,10 @@ void makeDialogWindow(QWidget* dialog, QWidget* owner, QSize size) {
 void DialogWindow::show() {
     if (!isLoaded()) widget()->winId();
     QtWindow::show();
+    // A native window made in advance keeps its old place in the stacking order, and the main
+    // window is raised whenever a dialog closes: without a window manager to stack the dialog
+    // above its owner, it would open hidden behind the window it disables.
+    if (isLoaded()) widget()->raise();
 }
 
 QLabel* discPicture(QWidget* parent) {

@@ -2,6 +2,7 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QFileSystemModel>
 #include <QFrame>
 #include <QGroupBox>
 #include <QIcon>
@@ -13,6 +14,7 @@
 #include <QTreeView>
 #include <QWindow>
 
+#include "app/dialog_window.h"
 #include "ui/qt/qt_controls.h"
 #include "ui/qt/qt_folders.h"
 
@@ -64,7 +66,7 @@ struct ExportView::Adapters {
           Check_noinfo(v.Check_noinfo),
           Text1(v.Text1) {}
 
-    ui::qt::QtWindow window;
+    DialogWindow window;
     ui::qt::QtLabel Label1;
     ui::qt::QtDirList Dir1;
     ui::qt::QtDriveList Drive1;
@@ -115,6 +117,18 @@ ExportView::ExportView(QWidget* owner) : window_(std::make_unique<QWidget>()) {
 
     a_ = std::make_unique<Adapters>(*this);
     layOut();
+
+    // The folder list reads its folders in the background, and each folder read pushes the rows
+    // below it down: keep the chosen folder in sight while its parent folders are still coming.
+    QFileSystemModel* folders = a_->Dir1.model();
+    QTreeView* tree = Dir1;
+    QObject::connect(folders, &QFileSystemModel::directoryLoaded, tree,
+                     [tree, folders](const QString& loaded) {
+                         const QModelIndex current = tree->currentIndex();
+                         if (current.isValid() && folders->filePath(current).startsWith(loaded)) {
+                             tree->scrollTo(current);
+                         }
+                     });
 
     w->setWindowFlags(Qt::Dialog | Qt::WindowTitleHint | Qt::WindowCloseButtonHint |
                       Qt::CustomizeWindowHint);
