@@ -101,6 +101,8 @@ struct Fields {
 class EntryIndex {
 public:
     explicit EntryIndex(std::string_view text) : text_(text) {
+        // An entry takes at least twenty bytes; reserving for that many avoids rehashing.
+        titles_.reserve(text.size() / 20 + 1);
         for (std::size_t at = text.find(catalogue::kTitleTag); at != npos;
              at = text.find(catalogue::kTitleTag, at + 1)) {
             const std::size_t start = at + catalogue::kTitleTag.size();
@@ -173,6 +175,7 @@ struct FoldedEqual {
 class ArticleIndex {
 public:
     explicit ArticleIndex(std::string_view text) {
+        numbers_.reserve(text.size() / 9 + 1);  // an article line takes at least nine bytes
         std::size_t start = 0;
         while (start < text.size()) {
             std::size_t cr = text.find('\r', start);
