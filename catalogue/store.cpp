@@ -103,6 +103,17 @@ void refuseProtected(const std::string& fullPath, const std::string& shown) {
     }
 }
 
+// A target that the rename or unlink after the commit point would fail on (a folder, a name the
+// system refuses) could never be finished by any recovery: it is refused while nothing changed.
+void refuseUnreplaceable(const std::string& fullPath, const std::string& shown) {
+    struct stat st {};
+    if (::lstat(fullPath.c_str(), &st) != 0) {
+        if (errno != ENOENT) throw osError(shown, errno);
+        return;
+    }
+    if (S_ISDIR(st.st_mode)) throw osError(shown, EISDIR);
+}
+
 }  // namespace
 
 Store::Store(std::string folder, Sys& sys) : folder_(std::move(folder)), sys_(sys) {
@@ -110,6 +121,12 @@ Store::Store(std::string folder, Sys& sys) : folder_(std::move(folder)), sys_(sy
 }
 
 std::string Store::path(std::string_view name) const {
+    // Names come from the list index too, which may have been edited by hand: one holding a NUL
+    // byte would be cut short by the system and one holding "/" would reach another folder.
+    if (name.empty() || name == "." || name == ".." ||
+        name.find_first_of(std::string_view("/\0", 2)) != std::string_view::npos) {
+        throw CatalogueError(std::string(name), "this is no file name of the catalogue folder");
+    }
     std::string full = folder_;
     if (!full.ends_with('/')) full.push_back('/');
     full.append(name);
@@ -211,7 +228,10 @@ void Transaction::commit() {
 
     Store& s = store_;
     s.recover();
-    for (const Action& action : plan) refuseProtected(s.path(action.name), action.name);
+    for (const Action& action : plan) {
+        refuseProtected(s.path(action.name), action.name);
+        refuseUnreplaceable(s.path(action.name), action.name);
+    }
 
     JournalPlan journal;
     try {

@@ -49,7 +49,8 @@ public:
     const std::string& folder() const { return folder_; }
     Sys& sys() { return sys_; }
 
-    // Full path of a file of the folder.
+    // Full path of a file of the folder. Throws CatalogueError for a name that is no plain file
+    // name: empty, "." or "..", or holding "/" or a NUL byte.
     std::string path(std::string_view name) const;
 
     // The file's raw bytes. Throws when it cannot be opened or read.
