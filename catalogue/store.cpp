@@ -305,6 +305,19 @@ void Transaction::commit() {
 void writeFileAtomically(const std::string& fullPath, std::string_view bytes, Sys& sys) {
     const std::string shown = baseName(fullPath);
     refuseProtected(fullPath, shown);
+    // A staged copy of this file left by an earlier write that was stopped dead goes first; the
+    // output folder has no start-up recovery of its own.
+    std::error_code ec;
+    for (const auto& item : std::filesystem::directory_iterator(folderOf(fullPath), ec)) {
+        const std::string name = item.path().filename().string();
+        if (name.starts_with(shown + ".") && name.ends_with(kTempSuffix)) {
+            const std::string_view middle = std::string_view(name).substr(
+                shown.size() + 1, name.size() - shown.size() - 1 - kTempSuffix.size());
+            if (!middle.empty() && middle.find_first_not_of("0123456789") == std::string_view::npos) {
+                sys.unlink(item.path().string());
+            }
+        }
+    }
     const std::string staged =
         fullPath + "." + std::to_string(::getpid()) + std::string(kTempSuffix);
     writeAll(sys, staged, shown, bytes);

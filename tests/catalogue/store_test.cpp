@@ -148,6 +148,15 @@ TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFile) {
     expectError([&] { writeFileAtomically(report, "x"); }, "Rock.TXT", EACCES);
     EXPECT_EQ(folder.get("Rock.TXT"), "written three bytes at a time\r\n");
     ::chmod(report.c_str(), 0644);
+
+    // A staged copy left by a write that was stopped dead is cleared by the next write of the
+    // same report; other files, the user's own included, stay.
+    folder.put("Rock.TXT.4242.pemla-tmp", "stale");
+    folder.put("Rock.TXT.mine.pemla-tmp", "not ours");
+    folder.put("Pop.TXT.4242.pemla-tmp", "another report's");
+    writeFileAtomically(report, "third\r\n");
+    EXPECT_EQ(folder.listing(),
+              "Pop.TXT.4242.pemla-tmp\nRock.TXT\nRock.TXT.mine.pemla-tmp\n");
 }
 
 TEST_F(StoreTest, WriteFileAtomicallyKeepsTheOldFileOnFailure) {
