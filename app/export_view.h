@@ -20,7 +20,7 @@ namespace app {
 // window without a parent, kept above `owner`, so disabling the main window leaves it usable.
 // The working controls Check_noinfo and Text1 exist but are hidden: the user never sets them.
 class ExportView {
-public:
+  public:
     explicit ExportView(QWidget* owner = nullptr);
     ~ExportView();
 
@@ -48,7 +48,7 @@ public:
     QCheckBox* Check_noinfo;
     QLineEdit* Text1;
 
-private:
+  private:
     void layOut();
 
     std::unique_ptr<QWidget> window_;

@@ -13,7 +13,7 @@ namespace {
 
 // The window's own background: a dark blue field with a few discs drawn on it.
 class Backdrop : public QWidget {
-protected:
+  protected:
     void paintEvent(QPaintEvent*) override {
         QPainter p(this);
         p.setRenderHint(QPainter::Antialiasing);
@@ -126,10 +126,10 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     a_ = std::make_unique<Adapters>(*this);
     layOut();
 
-    QWidget* order[] = {Text1,          Combo1,          Combo2,         Combo3,
-                        Command_add,    Command_change,  Command_clear,  Command_search,
-                        Command_delentry, Command_export, Command_print, Command_create,
-                        Command_delete, List_list,       List1};
+    QWidget* order[] = {
+        Text1,          Combo1,         Combo2,         Combo3,           Command_add,
+        Command_change, Command_clear,  Command_search, Command_delentry, Command_export,
+        Command_print,  Command_create, Command_delete, List_list,        List1};
     for (std::size_t i = 1; i < std::size(order); ++i) QWidget::setTabOrder(order[i - 1], order[i]);
 }
 
@@ -155,8 +155,8 @@ void MainWindowView::layOut() {
     List1->setGeometry(372, 30, 316, 246);
 
     // The column header is one text; each field starts under its word.
-    const QString header = Label4->text().isEmpty() ? QString(main_window::kColumnHeader.c_str())
-                                                    : Label4->text();
+    const QString header =
+        Label4->text().isEmpty() ? QString(main_window::kColumnHeader.c_str()) : Label4->text();
     const QFontMetrics metrics(Label4->font());
     const int left = 12;
     auto column = [&](const char* word) {
@@ -182,11 +182,11 @@ void MainWindowView::layOut() {
 
 main_window::Form1Controls MainWindowView::controls() {
     Adapters& a = *a_;
-    return {a.window,      a.Label1,         a.List_list,      a.Command_create, a.Command_delete,
-            a.Label2,      a.List1,          a.Command_search, a.Command_delentry,
-            a.Command_export, a.Command_print, a.Label4,       a.Text1,          a.Combo1,
-            a.Combo2,      a.Combo3,         a.Label3,         a.Textart,        a.Command_add,
-            a.Command_change, a.Command_clear};
+    return {a.window,        a.Label1, a.List_list,      a.Command_create,   a.Command_delete,
+            a.Label2,        a.List1,  a.Command_search, a.Command_delentry, a.Command_export,
+            a.Command_print, a.Label4, a.Text1,          a.Combo1,           a.Combo2,
+            a.Combo3,        a.Label3, a.Textart,        a.Command_add,      a.Command_change,
+            a.Command_clear};
 }
 
 }  // namespace app

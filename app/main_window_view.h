@@ -16,7 +16,7 @@ namespace app {
 
 // The main window's widgets, laid out, with their control adapters.
 class MainWindowView {
-public:
+  public:
     MainWindowView();
     ~MainWindowView();
 
@@ -44,7 +44,7 @@ public:
     QPushButton* Command_change;
     QPushButton* Command_clear;
 
-private:
+  private:
     void layOut();
 
     std::unique_ptr<QWidget> window_;

@@ -1,6 +1,5 @@
 // Times creating a list and exporting the largest lists, each against its own floor.
 #include <benchmark/benchmark.h>
-
 #include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -28,8 +27,9 @@ struct MemoryNewList {
 void BM_CreateList(benchmark::State& state) {
     World& w = World::get(static_cast<int>(state.range(0)));
     MemoryNewList d;
-    new_list::Form_new_list dialog({d.window, d.Label1, d.Text1, d.Check_info, d.Command1, d.Command2},
-                                   w.platform, w.store, *w.form);
+    new_list::Form_new_list dialog(
+        {d.window, d.Label1, d.Text1, d.Check_info, d.Command1, d.Command2}, w.platform, w.store,
+        *w.form);
     const std::string index = w.store.readBytes("pemla.dat");
     for (auto _ : state) {
         d.window.show();
@@ -66,9 +66,9 @@ struct MemoryExport {
     ui::memory::MemoryTextBox Text1;
 
     exporting::Form_ExportControls controls() {
-        return {window,    Label1,      Dir1,         Drive1,        Command1, Command2,
-                Checkart,  Checkhtml,   Checkcounter, Checkdate,     Checkline, Check_lastadd,
-                Label2,    Text2,       Label3,       Combo1,        Check_noinfo, Text1};
+        return {window,   Label1,    Dir1,         Drive1,    Command1,     Command2,
+                Checkart, Checkhtml, Checkcounter, Checkdate, Checkline,    Check_lastadd,
+                Label2,   Text2,     Label3,       Combo1,    Check_noinfo, Text1};
     }
 };
 
@@ -132,8 +132,8 @@ long exportPeakKilobytes() {
         const std::string out = w.folder + "/reports";
         std::filesystem::create_directories(out);
         d.Dir1.setPath(out);
-        for (auto* box : {&d.Checkart, &d.Checkcounter, &d.Checkdate, &d.Checkline,
-                          &d.Check_lastadd}) {
+        for (auto* box :
+             {&d.Checkart, &d.Checkcounter, &d.Checkdate, &d.Checkline, &d.Check_lastadd}) {
             box->setValue(1);
         }
         d.Combo1.addItem("Top");

@@ -13,8 +13,8 @@
 #include <sstream>
 
 #include "app/main_window_view.h"
-#include "bench/catalogue_maker.h"
 #include "bench/bench_world.h"
+#include "bench/catalogue_maker.h"
 #include "catalogue/store.h"
 #include "main_window/form1.h"
 #include "ui/qt/qt_platform.h"
@@ -95,8 +95,12 @@ void change(benchmark::State& state, const char* newTitle) {
     }
 }
 
-void BM_ChangeSameLetter(benchmark::State& state) { change(state, "Moon Changed"); }
-void BM_ChangeNewLetter(benchmark::State& state) { change(state, "Benchmark changed"); }
+void BM_ChangeSameLetter(benchmark::State& state) {
+    change(state, "Moon Changed");
+}
+void BM_ChangeNewLetter(benchmark::State& state) {
+    change(state, "Benchmark changed");
+}
 
 void BM_Delete(benchmark::State& state) {
     World& w = World::get(static_cast<int>(state.range(0)));
@@ -125,7 +129,7 @@ BENCHMARK(BM_Delete)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond);
 
 // Collects every result and prints one table with each row's ratio to the floor of its size.
 class TableReporter : public benchmark::BenchmarkReporter {
-public:
+  public:
     bool ReportContext(const Context&) override { return true; }
     void ReportRuns(const std::vector<Run>& runs) override {
         for (const Run& run : runs) {
@@ -133,8 +137,8 @@ public:
                 std::printf("%s: %s\n", run.benchmark_name().c_str(), run.error_message.c_str());
                 continue;
             }
-            rows_.push_back({run.run_name.function_name, run.run_name.args,
-                             run.GetAdjustedRealTime()});
+            rows_.push_back(
+                {run.run_name.function_name, run.run_name.args, run.GetAdjustedRealTime()});
         }
     }
     void Finalize() override {
@@ -149,16 +153,17 @@ public:
         std::printf("| operation | entries | time (ms) | x floor |\n|---|---|---:|---:|\n");
         for (const Row& row : rows_) {
             const int entries = size(row.args);
-            const std::string base = row.name.starts_with("BM_Export") ? "BM_ExportFloor" : "BM_Floor";
+            const std::string base =
+                row.name.starts_with("BM_Export") ? "BM_ExportFloor" : "BM_Floor";
             auto found = floor.find({base, entries});
             if (found == floor.end()) found = floor.find({base, entries + 1});
             const double ratio = found == floor.end() ? 0.0 : row.ms / found->second;
-            std::printf("| %s | %s | %.2f | %.2f |\n", row.name.substr(3).c_str(),
-                        row.args.c_str(), row.ms, ratio);
+            std::printf("| %s | %s | %.2f | %.2f |\n", row.name.substr(3).c_str(), row.args.c_str(),
+                        row.ms, ratio);
         }
     }
 
-private:
+  private:
     struct Row {
         std::string name;
         std::string args;

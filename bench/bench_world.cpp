@@ -47,7 +47,9 @@ World& World::get(int entries) {
     return *slot;
 }
 
-void World::clear() { worlds().clear(); }
+void World::clear() {
+    worlds().clear();
+}
 
 void World::restore() {
     for (const auto& [name, bytes] : original) {

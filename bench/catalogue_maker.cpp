@@ -21,12 +21,12 @@ void put(const std::string& path, const std::string& bytes) {
 
 void writeList(const std::string& folder, const std::string& name, int entries) {
     static const std::vector<std::string> starts = {
-        "Abbey", "Blue",  "Cosmic", "Dark",  "Echoes", "Fire",   "Golden", "Hidden", "Iron",
-        "Jazz",  "King",  "Lost",   "Moon",  "Night",  "Ocean",  "Paper",  "Quiet",  "Red",
-        "Silver", "Time", "Under",  "Velvet", "Wild",  "Xeno",   "Yellow", "Zero",   "2001",
-        "\xC9t\xE9", "(Live)"};
-    static const std::vector<std::string> ends = {"Road", "Dreams", "Nights", "Collection",
-                                                  "Live at the Hall", "Part II", "Odyssey"};
+        "Abbey",  "Blue", "Cosmic", "Dark",      "Echoes", "Fire",   "Golden", "Hidden",
+        "Iron",   "Jazz", "King",   "Lost",      "Moon",   "Night",  "Ocean",  "Paper",
+        "Quiet",  "Red",  "Silver", "Time",      "Under",  "Velvet", "Wild",   "Xeno",
+        "Yellow", "Zero", "2001",   "\xC9t\xE9", "(Live)"};
+    static const std::vector<std::string> ends = {
+        "Road", "Dreams", "Nights", "Collection", "Live at the Hall", "Part II", "Odyssey"};
     static const std::vector<std::string> types = {"Music CD", "DVD video", "Game", "Software",
                                                    "Audiobook"};
     static const std::vector<std::string> infos = {"Original", "Copy", "Lent out", "Boxed"};

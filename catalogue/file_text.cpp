@@ -64,9 +64,13 @@ std::optional<long> firstNumber(std::string_view bytes) {
     return negative ? -value : value;
 }
 
-long leadingNumber(std::string_view text) { return firstNumber(text).value_or(0); }
+long leadingNumber(std::string_view text) {
+    return firstNumber(text).value_or(0);
+}
 
-std::string fileNumber(long value) { return labelNumber(value) + " "; }
+std::string fileNumber(long value) {
+    return labelNumber(value) + " ";
+}
 
 std::string labelNumber(long value) {
     return value < 0 ? std::to_string(value) : " " + std::to_string(value);

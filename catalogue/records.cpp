@@ -36,10 +36,18 @@ std::size_t entryEnd(std::string_view text, std::size_t at) {
 
 }  // namespace
 
-std::string entryFile(std::string_view list) { return std::string(list) + ".dat"; }
-std::string articleFile(std::string_view list) { return std::string(list) + ".art"; }
-std::string counterFile(std::string_view list) { return std::string(list) + ".arn"; }
-std::string flagFile(std::string_view list) { return std::string(list) + ".inf"; }
+std::string entryFile(std::string_view list) {
+    return std::string(list) + ".dat";
+}
+std::string articleFile(std::string_view list) {
+    return std::string(list) + ".art";
+}
+std::string counterFile(std::string_view list) {
+    return std::string(list) + ".arn";
+}
+std::string flagFile(std::string_view list) {
+    return std::string(list) + ".inf";
+}
 
 std::optional<std::vector<std::string>> entryTitles(std::string_view bytes) {
     const std::vector<std::string_view> lines = splitLines(bytes);

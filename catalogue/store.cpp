@@ -4,8 +4,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <cerrno>
 #include <algorithm>
+#include <cerrno>
 #include <filesystem>
 #include <set>
 
@@ -25,7 +25,8 @@ std::string readAll(Sys& sys, const std::string& fullPath, const std::string& sh
     if (fd < 0) throw osError(shown, errno);
     std::string bytes;
     struct stat st {};
-    if (::fstat(fd, &st) == 0 && S_ISREG(st.st_mode)) bytes.reserve(static_cast<size_t>(st.st_size));
+    if (::fstat(fd, &st) == 0 && S_ISREG(st.st_mode))
+        bytes.reserve(static_cast<size_t>(st.st_size));
     char buffer[65536];
     for (;;) {
         const ssize_t got = sys.read(fd, buffer, sizeof buffer);
@@ -133,9 +134,13 @@ std::string Store::path(std::string_view name) const {
     return full;
 }
 
-std::string Store::readBytes(const std::string& name) { return readAll(sys_, path(name), name); }
+std::string Store::readBytes(const std::string& name) {
+    return readAll(sys_, path(name), name);
+}
 
-std::string Store::readText(const std::string& name) { return toFileText(readBytes(name)); }
+std::string Store::readText(const std::string& name) {
+    return toFileText(readBytes(name));
+}
 
 std::optional<std::string> Store::readTextIfExists(const std::string& name) {
     struct stat st {};
@@ -164,7 +169,9 @@ void Store::writeDurable(const std::string& fullPath, const std::string& shownNa
     writeAll(sys_, fullPath, shownName, bytes);
 }
 
-void Store::syncFolder() { syncDirectory(sys_, folder_, folder_); }
+void Store::syncFolder() {
+    syncDirectory(sys_, folder_, folder_);
+}
 
 std::string Store::tempName(const std::string& name) {
     return name + "." + std::to_string(::getpid()) + "-" + std::to_string(++serial_) +
@@ -213,7 +220,9 @@ void Transaction::write(const std::string& name, std::string_view text) {
     actions_.push_back({name, true, forWriting(text)});
 }
 
-void Transaction::remove(const std::string& name) { actions_.push_back({name, false, {}}); }
+void Transaction::remove(const std::string& name) {
+    actions_.push_back({name, false, {}});
+}
 
 void Transaction::commit() {
     if (actions_.empty()) return;
@@ -313,7 +322,8 @@ void writeFileAtomically(const std::string& fullPath, std::string_view bytes, Sy
         if (name.starts_with(shown + ".") && name.ends_with(kTempSuffix)) {
             const std::string_view middle = std::string_view(name).substr(
                 shown.size() + 1, name.size() - shown.size() - 1 - kTempSuffix.size());
-            if (!middle.empty() && middle.find_first_not_of("0123456789") == std::string_view::npos) {
+            if (!middle.empty() &&
+                middle.find_first_not_of("0123456789") == std::string_view::npos) {
                 sys.unlink(item.path().string());
             }
         }

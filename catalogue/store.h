@@ -21,7 +21,7 @@ class Store;
 
 // One operation's set of changes. Nothing reaches the disk before commit().
 class Transaction {
-public:
+  public:
     explicit Transaction(Store& store) : store_(store) {}
 
     // Plans `name` to hold `text`, ending with exactly one CR LF after its last line.
@@ -32,7 +32,7 @@ public:
     // an earlier one.
     void commit();
 
-private:
+  private:
     struct Action {
         std::string name;
         bool isWrite;
@@ -43,7 +43,7 @@ private:
 };
 
 class Store {
-public:
+  public:
     explicit Store(std::string folder, Sys& sys = realSys());
 
     const std::string& folder() const { return folder_; }
@@ -71,7 +71,7 @@ public:
 
     Transaction begin() { return Transaction(*this); }
 
-private:
+  private:
     friend class Transaction;
 
     void writeDurable(const std::string& fullPath, const std::string& shownName,
@@ -89,7 +89,6 @@ private:
 // Writes one file atomically, outside any catalogue folder (reports): a temporary file in the
 // same folder, flushed, then renamed over the target. Throws CatalogueError on any failure,
 // leaving an older file of that name untouched.
-void writeFileAtomically(const std::string& fullPath, std::string_view bytes,
-                         Sys& sys = realSys());
+void writeFileAtomically(const std::string& fullPath, std::string_view bytes, Sys& sys = realSys());
 
 }  // namespace catalogue

@@ -9,7 +9,7 @@
 namespace catalogue {
 
 class Sys {
-public:
+  public:
     virtual ~Sys() = default;
 
     virtual int open(const std::string& path, int flags, mode_t mode);

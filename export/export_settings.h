@@ -34,12 +34,12 @@ std::optional<ExportSettings> decodeSettings(std::string_view bytes);
 // with a double quote runs to the next one on its line (the rest up to the next comma or line end
 // is dropped); any other value runs to the first comma or line end. CR, LF and CR LF end a line.
 class SettingsReader {
-public:
+  public:
     explicit SettingsReader(std::string_view text) : text_(text) {}
     // The next value; nothing at the end of the text or at an unclosed quote.
     std::optional<std::string> next();
 
-private:
+  private:
     void skipPastDelimiter();
     std::string_view text_;
     std::size_t pos_ = 0;

@@ -18,7 +18,7 @@ namespace {
 
 // Enables the dialog again however the run ends.
 class DisabledWhileRunning {
-public:
+  public:
     explicit DisabledWhileRunning(ui::Window& window) : window_(window) {
         window_.setEnabled(false);
     }
@@ -26,7 +26,7 @@ public:
     DisabledWhileRunning(const DisabledWhileRunning&) = delete;
     DisabledWhileRunning& operator=(const DisabledWhileRunning&) = delete;
 
-private:
+  private:
     ui::Window& window_;
 };
 

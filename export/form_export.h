@@ -39,7 +39,7 @@ inline constexpr std::string_view kCreditText = "Exported from the disc catalogu
 static_assert(kCreditText.size() == 41);
 
 class Form_Export {
-public:
+  public:
     // Sets the captions and initial texts and wires every event to its handler.
     Form_Export(const Form_ExportControls& controls, ui::Platform& platform,
                 catalogue::Store& store, main_window::Form1& form1);
@@ -75,7 +75,7 @@ public:
     // Throws CatalogueError when a list file is missing or unreadable.
     std::string BuildReport(const std::string& list);
 
-private:
+  private:
     bool loadSettingsFile();
     bool applySettings(const ExportSettings& settings);
     std::string workingFolder() const;

@@ -99,7 +99,7 @@ struct Fields {
 // search from the start of the text would find it. The other fields are found by the positions
 // of their markers, so a title costs a few binary searches however long the text is.
 class EntryIndex {
-public:
+  public:
     explicit EntryIndex(std::string_view text) : text_(text) {
         // An entry takes at least twenty bytes; reserving for that many avoids rehashing.
         titles_.reserve(text.size() / 20 + 1);
@@ -126,7 +126,7 @@ public:
         return fields;
     }
 
-private:
+  private:
     void collect(std::string_view tag, std::vector<std::size_t>& positions) const {
         for (std::size_t at = text_.find(tag); at != npos; at = text_.find(tag, at + 1)) {
             positions.push_back(at);
@@ -173,7 +173,7 @@ struct FoldedEqual {
 // is "title#*\number"; each "#*\" of a line could end the title, as the line-by-line search of
 // the catalogue would allow.
 class ArticleIndex {
-public:
+  public:
     explicit ArticleIndex(std::string_view text) {
         numbers_.reserve(text.size() / 9 + 1);  // an article line takes at least nine bytes
         std::size_t start = 0;
@@ -198,7 +198,7 @@ public:
         return hit == numbers_.end() ? std::string_view() : hit->second;
     }
 
-private:
+  private:
     std::unordered_map<std::string_view, std::string_view, FoldedHash, FoldedEqual> numbers_;
 };
 

@@ -24,7 +24,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     }
     (void)catalogue::firstNumber(bytes);
     for (std::size_t i = 1; i < lines.size(); ++i) {
-        if (catalogue::itemLess(lines[i], lines[i - 1]) && catalogue::itemLess(lines[i - 1], lines[i])) {
+        if (catalogue::itemLess(lines[i], lines[i - 1]) &&
+            catalogue::itemLess(lines[i - 1], lines[i])) {
             std::abort();
         }
     }

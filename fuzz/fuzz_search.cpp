@@ -12,8 +12,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const std::size_t numberLength = std::min<std::size_t>(data[0] % 6, size - 1);
     const std::string number(reinterpret_cast<const char*>(data) + 1, numberLength);
     const std::string articleText =
-        "\r\n" + catalogue::toFileText(std::string(reinterpret_cast<const char*>(data) + 1 + numberLength,
-                                                   size - 1 - numberLength));
+        "\r\n" +
+        catalogue::toFileText(std::string(reinterpret_cast<const char*>(data) + 1 + numberLength,
+                                          size - 1 - numberLength));
     const auto title = search::titleBefore(articleText, number);
     if (!title) return 0;
     if (articleText.find(*title) == std::string::npos) std::abort();

@@ -62,9 +62,11 @@ void Form1::Form_Load() {
         return;
     } catch (const CatalogueError& error) {
         std::error_code ec;
-        const std::string folder = std::filesystem::absolute(store_.folder(), ec).lexically_normal();
-        platform_.messageBox("Pemla cannot start: the file \"" + error.file() + "\" in the folder \"" +
-                                 folder + "\" cannot be used (" + error.reason() + ").",
+        const std::string folder =
+            std::filesystem::absolute(store_.folder(), ec).lexically_normal();
+        platform_.messageBox("Pemla cannot start: the file \"" + error.file() +
+                                 "\" in the folder \"" + folder + "\" cannot be used (" +
+                                 error.reason() + ").",
                              16, "Error");
     }
     platform_.endProgram(1);
@@ -112,7 +114,9 @@ void Form1::Command_search_Click() {
     platform_.beep();
 }
 
-void Form1::Command_print_Click() { platform_.endProgram(0); }
+void Form1::Command_print_Click() {
+    platform_.endProgram(0);
+}
 
 std::string Form1::selectedList() const {
     std::string name;

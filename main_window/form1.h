@@ -49,7 +49,7 @@ inline constexpr const char* kNoAmount = "... amount ...";
 extern const std::string kColumnHeader;
 
 class Form1 {
-public:
+  public:
     // Sets the captions and initial texts and wires every event to its handler.
     Form1(const Form1Controls& controls, ui::Platform& platform, catalogue::Store& store);
 
@@ -117,7 +117,7 @@ public:
     int EntryCount = 0;
     std::string ArticleNumber;
 
-private:
+  private:
     void fillSuggestions(const std::string& file, ui::ComboBox& box);
     void limitTyping(ui::ComboBox& box, std::size_t limit, int& key);
     // The fields as an entry, refused when a value could not be stored safely.

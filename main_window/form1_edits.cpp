@@ -14,8 +14,9 @@ using catalogue::CatalogueError;
 namespace {
 
 char upperFirst(const std::string& text) {
-    return text.empty() ? '\0' : static_cast<char>(catalogue::upperByte(
-                                     static_cast<unsigned char>(text.front())));
+    return text.empty()
+               ? '\0'
+               : static_cast<char>(catalogue::upperByte(static_cast<unsigned char>(text.front())));
 }
 
 }  // namespace
@@ -23,10 +24,11 @@ char upperFirst(const std::string& text) {
 catalogue::Entry Form1::fieldsAsEntry() const {
     catalogue::Entry entry{c_.Text1.text(), c_.Combo1.text(), c_.Combo2.text(), c_.Combo3.text()};
     if (entry.title.empty()) throw Refusal{"Please type a title first."};
-    const std::pair<const char*, const std::string*> fields[] = {{"The title", &entry.title},
-                                                                 {"The type", &entry.type},
-                                                                 {"The number of discs", &entry.discs},
-                                                                 {"The information", &entry.information}};
+    const std::pair<const char*, const std::string*> fields[] = {
+        {"The title", &entry.title},
+        {"The type", &entry.type},
+        {"The number of discs", &entry.discs},
+        {"The information", &entry.information}};
     for (const auto& [label, value] : fields) {
         const std::string problem = catalogue::valueProblem(*value, value == &entry.title);
         if (!problem.empty()) {
@@ -57,9 +59,10 @@ void Form1::NextArticleNumber(char firstCharacter, const std::string& list,
                           "999) has been handed out in this list, so no other title that files "
                           "under this letter can be stored in it."};
         case catalogue::CounterProblem::Damaged:
-            throw CatalogueError(file, std::string("the record of the letter ") + letter +
-                                           " is damaged");
-        case catalogue::CounterProblem::None: break;
+            throw CatalogueError(file,
+                                 std::string("the record of the letter ") + letter + " is damaged");
+        case catalogue::CounterProblem::None:
+            break;
     }
     catalogue::ArticleNumberResult next = catalogue::nextArticleNumber(counter, firstCharacter);
     t.write(file, next.counterText);
@@ -95,7 +98,8 @@ void Form1::Command_add_Click() {
         t.write(catalogue::entryFile(list), newText);
         NextArticleNumber(entry.title.front(), list, t);
         const std::string articleFile = catalogue::articleFile(list);
-        std::string articles = catalogue::forWriting(store_.readTextIfExists(articleFile).value_or(""));
+        std::string articles =
+            catalogue::forWriting(store_.readTextIfExists(articleFile).value_or(""));
         articles += catalogue::articleLine(entry.title, ArticleNumber);
         t.write(articleFile, articles);
         t.commit();
@@ -141,7 +145,8 @@ void Form1::Command_change_Click() {
                 moved += catalogue::articleLine(entry.title, ArticleNumber);
                 t.write(articleFile, moved);
             } else {
-                t.write(articleFile, *catalogue::renameArticleLine(articles, *oldTitle, entry.title));
+                t.write(articleFile,
+                        *catalogue::renameArticleLine(articles, *oldTitle, entry.title));
             }
         }
         t.write(catalogue::entryFile(list), *newText);
@@ -206,9 +211,8 @@ void Form1::Command_delete_Click() {
         catalogue::Transaction t = store_.begin();
         std::string index = catalogue::forWriting(store_.readText("pemla.dat"));
         // Files that are already missing are simply not there to delete.
-        for (const std::string& file :
-             {catalogue::entryFile(name), catalogue::counterFile(name),
-              catalogue::articleFile(name), catalogue::flagFile(name)}) {
+        for (const std::string& file : {catalogue::entryFile(name), catalogue::counterFile(name),
+                                        catalogue::articleFile(name), catalogue::flagFile(name)}) {
             t.remove(file);
         }
         if (c_.List_list.count() == 1) {

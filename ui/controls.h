@@ -14,7 +14,7 @@ using Handler = std::function<void()>;
 using KeyHandler = std::function<void(int& key)>;
 
 class Window {
-public:
+  public:
     virtual ~Window() = default;
     // Shows the window without waiting. The first show runs onLoad first; showing a visible
     // window brings it to the front.
@@ -32,7 +32,7 @@ public:
 };
 
 class Button {
-public:
+  public:
     virtual ~Button() = default;
     virtual void setCaption(const std::string& caption) = 0;
     virtual void setEnabled(bool enabled) = 0;
@@ -40,7 +40,7 @@ public:
 };
 
 class Label {
-public:
+  public:
     virtual ~Label() = default;
     virtual void setCaption(const std::string& caption) = 0;
     virtual std::string caption() const = 0;
@@ -49,7 +49,7 @@ public:
 // Items are kept in one fixed order: case-insensitive, ties by byte value. One item at most is
 // selected. onClick fires when the user changes the selection, never when code does.
 class ListBox {
-public:
+  public:
     virtual ~ListBox() = default;
     virtual void addItem(const std::string& text) = 0;
     // Replaces every item in one go; the way to fill a long list.
@@ -66,7 +66,7 @@ public:
 
 // An editable combo box holds any text; a pick-only one only one of its items.
 class ComboBox {
-public:
+  public:
     virtual ~ComboBox() = default;
     virtual void addItem(const std::string& text) = 0;
     virtual void setItems(std::vector<std::string> items) = 0;
@@ -84,7 +84,7 @@ public:
 
 // Typing beyond the maximum length is refused; text set by code is kept whole.
 class TextBox {
-public:
+  public:
     virtual ~TextBox() = default;
     virtual std::string text() const = 0;
     virtual void setText(const std::string& text) = 0;
@@ -97,7 +97,7 @@ public:
 
 // 0 clear, 1 set, 2 greyed.
 class CheckBox {
-public:
+  public:
     virtual ~CheckBox() = default;
     virtual void setCaption(const std::string& caption) = 0;
     virtual int value() const = 0;
@@ -106,7 +106,7 @@ public:
 
 // The volumes the output can go to. onChange fires whenever the drive changes, also by code.
 class DriveList {
-public:
+  public:
     virtual ~DriveList() = default;
     virtual std::vector<std::string> drives() const = 0;
     virtual std::string drive() const = 0;
@@ -117,7 +117,7 @@ public:
 
 // A folder chooser. Its path has no trailing separator except at a volume's root.
 class DirList {
-public:
+  public:
     virtual ~DirList() = default;
     virtual std::string path() const = 0;
     // False (path unchanged) when the folder cannot be read.

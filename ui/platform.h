@@ -19,7 +19,7 @@ struct MessageStyle {
 MessageStyle decodeStyle(int style);
 
 class Platform {
-public:
+  public:
     virtual ~Platform() = default;
     // Shows a message box and waits for the answer (Ok for the OK-only styles).
     virtual Answer messageBox(const std::string& prompt, int style, const std::string& title) = 0;
@@ -35,13 +35,13 @@ public:
 
 // Shows the busy pointer for its lifetime, whatever way the scope is left.
 class BusyPointer {
-public:
+  public:
     explicit BusyPointer(Platform& platform) : platform_(platform) { platform_.beginBusy(); }
     ~BusyPointer() { platform_.endBusy(); }
     BusyPointer(const BusyPointer&) = delete;
     BusyPointer& operator=(const BusyPointer&) = delete;
 
-private:
+  private:
     Platform& platform_;
 };
 

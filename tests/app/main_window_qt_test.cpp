@@ -151,7 +151,8 @@ TEST(MainWindowOnQt, ComboBoxesStopTypingAtTheirLimits) {
         QComboBox* box;
         int limit;
     };
-    for (const Case& c : {Case{w.view.Combo1, 17}, Case{w.view.Combo2, 6}, Case{w.view.Combo3, 16}}) {
+    for (const Case& c :
+         {Case{w.view.Combo1, 17}, Case{w.view.Combo2, 6}, Case{w.view.Combo3, 16}}) {
         c.box->lineEdit()->clear();
         w.typeInto(c.box, QString(30, QChar('x')));
         EXPECT_EQ(c.box->currentText().size(), c.limit);

@@ -155,8 +155,7 @@ TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFile) {
     folder.put("Rock.TXT.mine.pemla-tmp", "not ours");
     folder.put("Pop.TXT.4242.pemla-tmp", "another report's");
     writeFileAtomically(report, "third\r\n");
-    EXPECT_EQ(folder.listing(),
-              "Pop.TXT.4242.pemla-tmp\nRock.TXT\nRock.TXT.mine.pemla-tmp\n");
+    EXPECT_EQ(folder.listing(), "Pop.TXT.4242.pemla-tmp\nRock.TXT\nRock.TXT.mine.pemla-tmp\n");
 }
 
 TEST_F(StoreTest, WriteFileAtomicallyKeepsTheOldFileOnFailure) {

@@ -45,7 +45,7 @@ struct MemoryFormExport {
 };
 
 class ExportFixture {
-public:
+  public:
     explicit ExportFixture(std::vector<std::string> drives = {"/"});
     ~ExportFixture();
 
@@ -63,7 +63,7 @@ public:
     MemoryFormExport dialog;
     exporting::Form_Export form;
 
-private:
+  private:
     std::string oldHome_;
     bool hadHome_ = false;
 };

@@ -103,7 +103,7 @@ TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) 
 }
 
 class ClosingTest : public Form1Test {
-protected:
+  protected:
     void SetUp() override {
         form->setDialogs({&newList, &exporter, &search});
         exporter.onUnload = [this] { unloaded.push_back("export"); };

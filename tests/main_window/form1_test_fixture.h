@@ -64,7 +64,7 @@ inline void expectTidy(const std::string& name, const std::string& bytes) {
 }
 
 class Form1Test : public ::testing::Test, public test_support::MainWindowFixture {
-protected:
+  protected:
     using Files = std::map<std::string, std::string>;
 
     // "Rock" in the order its entries were added; List1 shows 1st, abc, abcd, xabc, Zebra.

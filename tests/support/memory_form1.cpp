@@ -5,8 +5,7 @@
 namespace test_support {
 
 MemoryForm1::MemoryForm1() {
-    for (ui::memory::Owned* control :
-         std::initializer_list<ui::memory::Owned*>{
+    for (ui::memory::Owned* control : std::initializer_list<ui::memory::Owned*>{
              &List_list, &Command_create, &Command_delete, &List1, &Command_search,
              &Command_delentry, &Command_export, &Command_print, &Text1, &Combo1, &Combo2, &Combo3,
              &Textart, &Command_add, &Command_change, &Command_clear}) {
@@ -15,11 +14,10 @@ MemoryForm1::MemoryForm1() {
 }
 
 main_window::Form1Controls MemoryForm1::controls() {
-    return {window,         Label1,         List_list,     Command_create,   Command_delete,
-            Label2,         List1,          Command_search, Command_delentry, Command_export,
-            Command_print,  Label4,         Text1,         Combo1,           Combo2,
-            Combo3,         Label3,         Textart,       Command_add,      Command_change,
-            Command_clear};
+    return {window,      Label1,         List_list,        Command_create, Command_delete, Label2,
+            List1,       Command_search, Command_delentry, Command_export, Command_print,  Label4,
+            Text1,       Combo1,         Combo2,           Combo3,         Label3,         Textart,
+            Command_add, Command_change, Command_clear};
 }
 
 MainWindowFixture::MainWindowFixture() : store(folder.path()) {
@@ -38,7 +36,9 @@ void MainWindowFixture::putList(const std::string& name, const std::string& entr
     if (!flag.empty()) folder.put(name + ".inf", flag);
 }
 
-void MainWindowFixture::start() { view.window.show(); }
+void MainWindowFixture::start() {
+    view.window.show();
+}
 
 void MainWindowFixture::open(const std::string& list) {
     ASSERT_TRUE(view.List_list.userSelect(list)) << "no list " << list;

@@ -7,7 +7,7 @@ namespace test_support {
 
 // A fresh empty folder for one test, removed with everything in it afterwards.
 class TempFolder {
-public:
+  public:
     TempFolder();
     ~TempFolder();
     TempFolder(const TempFolder&) = delete;
@@ -23,7 +23,7 @@ public:
     // Every file name in the folder, sorted.
     std::string listing() const;
 
-private:
+  private:
     std::string path_;
 };
 

@@ -110,7 +110,8 @@ struct QtBackend {
     std::vector<std::string> displayed(ListBox& box) {
         auto* widget = static_cast<QListWidget*>(widgetOf.at(&box));
         std::vector<std::string> texts;
-        for (int i = 0; i < widget->count(); ++i) texts.push_back(qt::fromQt(widget->item(i)->text()));
+        for (int i = 0; i < widget->count(); ++i)
+            texts.push_back(qt::fromQt(widget->item(i)->text()));
         return texts;
     }
     void select(ListBox& box, int index) {
@@ -135,7 +136,7 @@ struct QtBackend {
 
 template <class Backend>
 class ControlContract : public ::testing::Test {
-protected:
+  protected:
     Backend b;
 };
 
@@ -163,8 +164,8 @@ TYPED_TEST(ControlContract, ListBoxKeepsOneOrderAndOneSelection) {
     list.setItems({"z", "b", "ABD", "Abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9", "c"});
     seen.clear();
     for (int i = 0; i < list.count(); ++i) seen.push_back(list.itemText(i));
-    const std::vector<std::string> expected{"aB", "Abc", "ABD", "b", "c", "new", "z",
-                                            "\xC9T\xC9", "\xE9t\xE9"};
+    const std::vector<std::string> expected{"aB",  "Abc", "ABD",       "b",        "c",
+                                            "new", "z",   "\xC9T\xC9", "\xE9t\xE9"};
     EXPECT_EQ(seen, expected);
     EXPECT_EQ(this->b.displayed(list), expected);
     for (int i = 0; i < list.count(); ++i) EXPECT_FALSE(list.selected(i)) << i;

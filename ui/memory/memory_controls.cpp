@@ -12,7 +12,9 @@ namespace {
 
 const TextBox* focused = nullptr;
 
-bool lessItem(const std::string& a, const std::string& b) { return catalogue::itemLess(a, b); }
+bool lessItem(const std::string& a, const std::string& b) {
+    return catalogue::itemLess(a, b);
+}
 
 }  // namespace
 
@@ -116,9 +118,13 @@ bool MemoryComboBox::userPick(int index) {
     return true;
 }
 
-void MemoryTextBox::setFocus() { focused = this; }
+void MemoryTextBox::setFocus() {
+    focused = this;
+}
 
-bool MemoryTextBox::hasFocus() const { return focused == this; }
+bool MemoryTextBox::hasFocus() const {
+    return focused == this;
+}
 
 void MemoryTextBox::type(const std::string& keys) {
     if (!acceptsInput()) return;

@@ -13,7 +13,7 @@
 namespace ui::memory {
 
 class MemoryWindow : public Window {
-public:
+  public:
     void show() override;
     void unload() override;
     bool isLoaded() const override { return loaded_; }
@@ -29,7 +29,7 @@ public:
     int loadCount() const { return loadCount_; }
     int unloadCount() const { return unloadCount_; }
 
-private:
+  private:
     bool loaded_ = false;
     bool enabled_ = true;
     int frontCount_ = 0;
@@ -40,38 +40,38 @@ private:
 
 // Base of the controls that sit on a window: input is refused while either is disabled.
 class Owned {
-public:
+  public:
     void setOwner(const MemoryWindow* owner) { owner_ = owner; }
     bool acceptsInput() const { return ownEnabled_ && (owner_ == nullptr || owner_->isEnabled()); }
 
-protected:
+  protected:
     const MemoryWindow* owner_ = nullptr;
     bool ownEnabled_ = true;
 };
 
 class MemoryButton : public Button, public Owned {
-public:
+  public:
     void setCaption(const std::string& caption) override { caption_ = caption; }
     void setEnabled(bool enabled) override { ownEnabled_ = enabled; }
     const std::string& caption() const { return caption_; }
     // The user presses the button; false when it takes no input.
     bool click();
 
-private:
+  private:
     std::string caption_;
 };
 
 class MemoryLabel : public Label {
-public:
+  public:
     void setCaption(const std::string& caption) override { caption_ = caption; }
     std::string caption() const override { return caption_; }
 
-private:
+  private:
     std::string caption_;
 };
 
 class MemoryListBox : public ListBox, public Owned {
-public:
+  public:
     void addItem(const std::string& text) override;
     void setItems(std::vector<std::string> items) override;
     void clear() override;
@@ -89,14 +89,14 @@ public:
     const std::vector<std::string>& items() const { return items_; }
     int refreshCount() const { return refreshCount_; }
 
-private:
+  private:
     std::vector<std::string> items_;
     int selected_ = -1;
     int refreshCount_ = 0;
 };
 
 class MemoryComboBox : public ComboBox, public Owned {
-public:
+  public:
     explicit MemoryComboBox(bool pickOnly = false) : pickOnly_(pickOnly) {}
     void addItem(const std::string& text) override { items_.push_back(text); }
     void setItems(std::vector<std::string> items) override { items_ = std::move(items); }
@@ -112,14 +112,14 @@ public:
     // The user picks an item from the drop-down list.
     bool userPick(int index);
 
-private:
+  private:
     bool pickOnly_;
     std::vector<std::string> items_;
     std::string text_;
 };
 
 class MemoryTextBox : public TextBox, public Owned {
-public:
+  public:
     std::string text() const override { return text_; }
     void setText(const std::string& text) override { text_ = text; }
     int maxLength() const override { return maxLength_; }
@@ -130,13 +130,13 @@ public:
     // The user types these characters; those beyond the maximum length are refused.
     void type(const std::string& keys);
 
-private:
+  private:
     std::string text_;
     int maxLength_ = 0;
 };
 
 class MemoryCheckBox : public CheckBox, public Owned {
-public:
+  public:
     void setCaption(const std::string& caption) override { caption_ = caption; }
     int value() const override { return value_; }
     void setValue(int value) override { value_ = value; }
@@ -144,30 +144,30 @@ public:
     bool userToggle();
     const std::string& caption() const { return caption_; }
 
-private:
+  private:
     std::string caption_;
     int value_ = 0;
 };
 
 class MemoryDriveList : public DriveList, public Owned {
-public:
+  public:
     explicit MemoryDriveList(std::vector<std::string> drives = {"/"});
     std::vector<std::string> drives() const override { return drives_; }
     std::string drive() const override { return drive_; }
     bool setDrive(const std::string& drive) override;
 
-private:
+  private:
     std::vector<std::string> drives_;
     std::string drive_;
 };
 
 // Follows the real file system: a path is accepted when it names a readable folder.
 class MemoryDirList : public DirList, public Owned {
-public:
+  public:
     std::string path() const override { return path_; }
     bool setPath(const std::string& path) override;
 
-private:
+  private:
     std::string path_ = "/";
 };
 
@@ -180,7 +180,7 @@ struct UnscriptedMessageBox {
 };
 
 class MemoryPlatform : public Platform {
-public:
+  public:
     struct Shown {
         std::string prompt;
         std::string title;
@@ -205,7 +205,7 @@ public:
     int endStatus() const { return endStatus_; }
     std::size_t unansweredCount() const { return answers_.size(); }
 
-private:
+  private:
     std::deque<Answer> answers_;
     std::vector<Shown> shown_;
     std::string date_ = "06.12.2026";

@@ -19,7 +19,9 @@ namespace {
 
 bool ending = false;
 
-bool lessItem(const std::string& a, const std::string& b) { return catalogue::itemLess(a, b); }
+bool lessItem(const std::string& a, const std::string& b) {
+    return catalogue::itemLess(a, b);
+}
 
 }  // namespace
 
@@ -39,9 +41,13 @@ QValidator::State Latin1Validator::validate(QString& input, int& /*pos*/) const 
     return Acceptable;
 }
 
-QtWindow::QtWindow(QWidget* widget) : widget_(widget) { widget_->installEventFilter(this); }
+QtWindow::QtWindow(QWidget* widget) : widget_(widget) {
+    widget_->installEventFilter(this);
+}
 
-void QtWindow::setEnding(bool value) { ending = value; }
+void QtWindow::setEnding(bool value) {
+    ending = value;
+}
 
 void QtWindow::show() {
     if (!loaded_) {
@@ -67,9 +73,13 @@ void QtWindow::unload() {
     closingByCode_ = false;
 }
 
-void QtWindow::setEnabled(bool enabled) { widget_->setEnabled(enabled); }
+void QtWindow::setEnabled(bool enabled) {
+    widget_->setEnabled(enabled);
+}
 
-bool QtWindow::isEnabled() const { return widget_->isEnabled(); }
+bool QtWindow::isEnabled() const {
+    return widget_->isEnabled();
+}
 
 void QtWindow::bringToFront() {
     widget_->show();
@@ -77,7 +87,9 @@ void QtWindow::bringToFront() {
     widget_->activateWindow();
 }
 
-void QtWindow::setCaption(const std::string& caption) { widget_->setWindowTitle(toQt(caption)); }
+void QtWindow::setCaption(const std::string& caption) {
+    widget_->setWindowTitle(toQt(caption));
+}
 
 bool QtWindow::eventFilter(QObject* watched, QEvent* event) {
     if (watched != widget_ || event->type() != QEvent::Close) return false;
@@ -101,15 +113,25 @@ QtButton::QtButton(QPushButton* button) : button_(button) {
     });
 }
 
-void QtButton::setCaption(const std::string& caption) { button_->setText(toQt(caption)); }
+void QtButton::setCaption(const std::string& caption) {
+    button_->setText(toQt(caption));
+}
 
-void QtButton::setEnabled(bool enabled) { button_->setEnabled(enabled); }
+void QtButton::setEnabled(bool enabled) {
+    button_->setEnabled(enabled);
+}
 
-QtLabel::QtLabel(QLabel* label) : label_(label) { label_->setTextFormat(Qt::PlainText); }
+QtLabel::QtLabel(QLabel* label) : label_(label) {
+    label_->setTextFormat(Qt::PlainText);
+}
 
-void QtLabel::setCaption(const std::string& caption) { label_->setText(toQt(caption)); }
+void QtLabel::setCaption(const std::string& caption) {
+    label_->setText(toQt(caption));
+}
 
-std::string QtLabel::caption() const { return fromQt(label_->text()); }
+std::string QtLabel::caption() const {
+    return fromQt(label_->text());
+}
 
 QtListBox::QtListBox(QListWidget* list) : list_(list) {
     list_->setSelectionMode(QAbstractItemView::SingleSelection);
@@ -151,8 +173,8 @@ bool QtListBox::applyFewChanges(const std::vector<std::string>& items) {
     // changing just those keeps a long list box from being rebuilt item by item.
     constexpr std::size_t kMaxChanges = 16;
     if (items_.empty()) return false;
-    const std::size_t gap = items.size() > items_.size() ? items.size() - items_.size()
-                                                          : items_.size() - items.size();
+    const std::size_t gap =
+        items.size() > items_.size() ? items.size() - items_.size() : items_.size() - items.size();
     if (gap > kMaxChanges) return false;
     struct Change {
         int row;
@@ -165,7 +187,8 @@ bool QtListBox::applyFewChanges(const std::vector<std::string>& items) {
     while (i < items_.size() || j < items.size()) {
         if (i < items_.size() && j < items.size() && items_[i] == items[j]) {
             ++i, ++j, ++row;
-        } else if (j >= items.size() || (i < items_.size() && catalogue::itemLess(items_[i], items[j]))) {
+        } else if (j >= items.size() ||
+                   (i < items_.size() && catalogue::itemLess(items_[i], items[j]))) {
             changes.push_back({row, nullptr});
             ++i;
         } else {
@@ -211,7 +234,9 @@ void QtListBox::setSelected(int index, bool selected) {
     byCode_ = false;
 }
 
-void QtListBox::refresh() { list_->viewport()->update(); }
+void QtListBox::refresh() {
+    list_->viewport()->update();
+}
 
 QtComboBox::QtComboBox(QComboBox* combo) : combo_(combo) {
     combo_->setInsertPolicy(QComboBox::NoInsert);
@@ -224,7 +249,9 @@ QtComboBox::QtComboBox(QComboBox* combo) : combo_(combo) {
     combo_->installEventFilter(this);
 }
 
-void QtComboBox::addItem(const std::string& text) { combo_->addItem(toQt(text)); }
+void QtComboBox::addItem(const std::string& text) {
+    combo_->addItem(toQt(text));
+}
 
 void QtComboBox::setItems(std::vector<std::string> items) {
     const QString keep = combo_->currentText();
@@ -235,11 +262,17 @@ void QtComboBox::setItems(std::vector<std::string> items) {
     if (combo_->isEditable()) combo_->setEditText(keep);
 }
 
-int QtComboBox::itemCount() const { return combo_->count(); }
+int QtComboBox::itemCount() const {
+    return combo_->count();
+}
 
-std::string QtComboBox::itemText(int index) const { return fromQt(combo_->itemText(index)); }
+std::string QtComboBox::itemText(int index) const {
+    return fromQt(combo_->itemText(index));
+}
 
-std::string QtComboBox::text() const { return fromQt(combo_->currentText()); }
+std::string QtComboBox::text() const {
+    return fromQt(combo_->currentText());
+}
 
 bool QtComboBox::setText(const std::string& text) {
     if (combo_->isEditable()) {
@@ -252,9 +285,13 @@ bool QtComboBox::setText(const std::string& text) {
     return true;
 }
 
-void QtComboBox::setEnabled(bool enabled) { combo_->setEnabled(enabled); }
+void QtComboBox::setEnabled(bool enabled) {
+    combo_->setEnabled(enabled);
+}
 
-bool QtComboBox::isEnabled() const { return combo_->isEnabled(); }
+bool QtComboBox::isEnabled() const {
+    return combo_->isEnabled();
+}
 
 bool QtComboBox::eventFilter(QObject* watched, QEvent* event) {
     if (watched != combo_ || event->type() != QEvent::KeyPress || !combo_->isEditable()) {
@@ -279,11 +316,14 @@ QtTextBox::QtTextBox(QLineEdit* edit) : edit_(edit) {
     edit_->setValidator(new Latin1Validator(edit_));
 }
 
-std::string QtTextBox::text() const { return fromQt(edit_->text()); }
+std::string QtTextBox::text() const {
+    return fromQt(edit_->text());
+}
 
 void QtTextBox::setText(const std::string& text) {
     // Text set by the program is kept whole even beyond the typing limit.
-    edit_->setMaxLength(std::max<int>({limit_ > 0 ? limit_ : 32767, static_cast<int>(text.size())}));
+    edit_->setMaxLength(
+        std::max<int>({limit_ > 0 ? limit_ : 32767, static_cast<int>(text.size())}));
     edit_->setText(toQt(text));
 }
 
@@ -297,25 +337,36 @@ void QtTextBox::applyLimit() {
     edit_->setMaxLength(std::max(limit_ > 0 ? limit_ : 32767, current));
 }
 
-void QtTextBox::setFocus() { edit_->setFocus(Qt::OtherFocusReason); }
+void QtTextBox::setFocus() {
+    edit_->setFocus(Qt::OtherFocusReason);
+}
 
-bool QtTextBox::hasFocus() const { return edit_->hasFocus(); }
+bool QtTextBox::hasFocus() const {
+    return edit_->hasFocus();
+}
 
 QtCheckBox::QtCheckBox(QCheckBox* box) : box_(box) {}
 
-void QtCheckBox::setCaption(const std::string& caption) { box_->setText(toQt(caption)); }
+void QtCheckBox::setCaption(const std::string& caption) {
+    box_->setText(toQt(caption));
+}
 
 int QtCheckBox::value() const {
     switch (box_->checkState()) {
-        case Qt::Checked: return 1;
-        case Qt::PartiallyChecked: return 2;
-        default: return 0;
+        case Qt::Checked:
+            return 1;
+        case Qt::PartiallyChecked:
+            return 2;
+        default:
+            return 0;
     }
 }
 
 void QtCheckBox::setValue(int value) {
     if (value == 2) box_->setTristate(true);
-    box_->setCheckState(value == 1 ? Qt::Checked : value == 2 ? Qt::PartiallyChecked : Qt::Unchecked);
+    box_->setCheckState(value == 1   ? Qt::Checked
+                        : value == 2 ? Qt::PartiallyChecked
+                                     : Qt::Unchecked);
 }
 
 }  // namespace ui::qt

@@ -24,7 +24,7 @@ std::string fromQt(const QString& text);
 
 // Refuses any character above U+00FF.
 class Latin1Validator : public QValidator {
-public:
+  public:
     using QValidator::QValidator;
     State validate(QString& input, int& pos) const override;
 };
@@ -32,7 +32,7 @@ public:
 // A top-level window. Its first show() runs onLoad; every closing (close box or unload())
 // runs onUnload. A disabled window ignores its close box.
 class QtWindow : public QObject, public Window {
-public:
+  public:
     explicit QtWindow(QWidget* widget);
     void show() override;
     void unload() override;
@@ -46,39 +46,39 @@ public:
     // Once the program is ending, closings run no handler.
     static void setEnding(bool ending);
 
-protected:
+  protected:
     bool eventFilter(QObject* watched, QEvent* event) override;
 
-private:
+  private:
     QWidget* widget_;
     bool loaded_ = false;
     bool closingByCode_ = false;
 };
 
 class QtButton : public Button {
-public:
+  public:
     explicit QtButton(QPushButton* button);
     void setCaption(const std::string& caption) override;
     void setEnabled(bool enabled) override;
 
-private:
+  private:
     QPushButton* button_;
 };
 
 class QtLabel : public Label {
-public:
+  public:
     explicit QtLabel(QLabel* label);
     void setCaption(const std::string& caption) override;
     std::string caption() const override;
 
-private:
+  private:
     QLabel* label_;
 };
 
 // Keeps its own copy of the items in the list box's order, so reading items costs nothing and
 // long lists are filled in one call.
 class QtListBox : public ListBox {
-public:
+  public:
     explicit QtListBox(QListWidget* list);
     void addItem(const std::string& text) override;
     void setItems(std::vector<std::string> items) override;
@@ -89,7 +89,7 @@ public:
     void setSelected(int index, bool selected) override;
     void refresh() override;
 
-private:
+  private:
     // Brings the list box to `items` by inserting and removing a few rows; false when more
     // would change and it is rebuilt instead.
     bool applyFewChanges(const std::vector<std::string>& items);
@@ -100,7 +100,7 @@ private:
 };
 
 class QtComboBox : public QObject, public ComboBox {
-public:
+  public:
     explicit QtComboBox(QComboBox* combo);
     void addItem(const std::string& text) override;
     void setItems(std::vector<std::string> items) override;
@@ -111,15 +111,15 @@ public:
     void setEnabled(bool enabled) override;
     bool isEnabled() const override;
 
-protected:
+  protected:
     bool eventFilter(QObject* watched, QEvent* event) override;
 
-private:
+  private:
     QComboBox* combo_;
 };
 
 class QtTextBox : public TextBox {
-public:
+  public:
     explicit QtTextBox(QLineEdit* edit);
     std::string text() const override;
     void setText(const std::string& text) override;
@@ -128,20 +128,20 @@ public:
     void setFocus() override;
     bool hasFocus() const override;
 
-private:
+  private:
     void applyLimit();
     QLineEdit* edit_;
     int limit_ = 0;
 };
 
 class QtCheckBox : public CheckBox {
-public:
+  public:
     explicit QtCheckBox(QCheckBox* box);
     void setCaption(const std::string& caption) override;
     int value() const override;
     void setValue(int value) override;
 
-private:
+  private:
     QCheckBox* box_;
 };
 

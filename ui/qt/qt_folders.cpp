@@ -45,7 +45,9 @@ std::vector<std::string> QtDriveList::drives() const {
     return out;
 }
 
-std::string QtDriveList::drive() const { return fromQt(combo_->currentText()); }
+std::string QtDriveList::drive() const {
+    return fromQt(combo_->currentText());
+}
 
 bool QtDriveList::setDrive(const std::string& drive) {
     const int index = combo_->findText(toQt(drive), Qt::MatchExactly | Qt::MatchCaseSensitive);

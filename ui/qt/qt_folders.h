@@ -12,7 +12,7 @@ namespace ui::qt {
 
 // The mounted volumes, as a pick-only combo box. onChange fires for the user and for code.
 class QtDriveList : public DriveList {
-public:
+  public:
     explicit QtDriveList(QComboBox* combo);
     std::vector<std::string> drives() const override;
     std::string drive() const override;
@@ -20,19 +20,19 @@ public:
     // Lists the volumes again.
     void reload();
 
-private:
+  private:
     QComboBox* combo_;
 };
 
 // The folders of one volume as a tree; the path is the folder the user picked.
 class QtDirList : public DirList {
-public:
+  public:
     explicit QtDirList(QTreeView* view);
     std::string path() const override { return path_; }
     bool setPath(const std::string& path) override;
     QFileSystemModel* model() const { return model_; }
 
-private:
+  private:
     QTreeView* view_;
     QFileSystemModel* model_;
     std::string path_;

@@ -29,11 +29,21 @@ Answer QtPlatform::messageBox(const std::string& prompt, int style, const std::s
     box.setTextFormat(Qt::PlainText);
     box.setText(toQt(prompt).replace(QStringLiteral("\r\n"), QStringLiteral("\n")));
     switch (decoded.icon) {
-        case MessageStyle::Icon::Critical: box.setIcon(QMessageBox::Critical); break;
-        case MessageStyle::Icon::Question: box.setIcon(QMessageBox::Question); break;
-        case MessageStyle::Icon::Exclamation: box.setIcon(QMessageBox::Warning); break;
-        case MessageStyle::Icon::Information: box.setIcon(QMessageBox::Information); break;
-        case MessageStyle::Icon::None: box.setIcon(QMessageBox::NoIcon); break;
+        case MessageStyle::Icon::Critical:
+            box.setIcon(QMessageBox::Critical);
+            break;
+        case MessageStyle::Icon::Question:
+            box.setIcon(QMessageBox::Question);
+            break;
+        case MessageStyle::Icon::Exclamation:
+            box.setIcon(QMessageBox::Warning);
+            break;
+        case MessageStyle::Icon::Information:
+            box.setIcon(QMessageBox::Information);
+            break;
+        case MessageStyle::Icon::None:
+            box.setIcon(QMessageBox::NoIcon);
+            break;
     }
     if (decoded.buttons == MessageStyle::Buttons::YesNo) {
         box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
@@ -49,15 +59,21 @@ Answer QtPlatform::messageBox(const std::string& prompt, int style, const std::s
     return pressed == QMessageBox::Yes ? Answer::Yes : Answer::No;
 }
 
-void QtPlatform::beep() { QApplication::beep(); }
+void QtPlatform::beep() {
+    QApplication::beep();
+}
 
 std::string QtPlatform::shortDate() {
     return fromQt(QLocale::system().toString(QDate::currentDate(), QLocale::ShortFormat));
 }
 
-void QtPlatform::beginBusy() { QApplication::setOverrideCursor(Qt::WaitCursor); }
+void QtPlatform::beginBusy() {
+    QApplication::setOverrideCursor(Qt::WaitCursor);
+}
 
-void QtPlatform::endBusy() { QApplication::restoreOverrideCursor(); }
+void QtPlatform::endBusy() {
+    QApplication::restoreOverrideCursor();
+}
 
 void QtPlatform::endProgram(int status) {
     ended_ = true;

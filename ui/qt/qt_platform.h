@@ -10,7 +10,7 @@ namespace ui::qt {
 
 // Message boxes, beep, date, busy pointer and ending the program on Qt.
 class QtPlatform : public Platform {
-public:
+  public:
     Answer messageBox(const std::string& prompt, int style, const std::string& title) override;
     void beep() override;
     std::string shortDate() override;
@@ -27,7 +27,7 @@ public:
     // text, icon, buttons, default button) when the hook sees it.
     static void setAnswerHook(std::function<Answer(QMessageBox&)> hook);
 
-private:
+  private:
     bool ended_ = false;
     int status_ = 0;
 };
