@@ -11,25 +11,17 @@
 #include "catalogue/store.h"
 #include "export/form_export.h"
 #include "new_list/form_new_list.h"
+#include "tests/support/memory_dialogs.h"
 
 namespace bench {
 namespace {
 
-struct MemoryNewList {
-    ui::memory::MemoryWindow window;
-    ui::memory::MemoryLabel Label1;
-    ui::memory::MemoryTextBox Text1;
-    ui::memory::MemoryCheckBox Check_info;
-    ui::memory::MemoryButton Command1;
-    ui::memory::MemoryButton Command2;
-};
+using test_support::MemoryNewList;
 
 void BM_CreateList(benchmark::State& state) {
     World& w = World::get(static_cast<int>(state.range(0)));
     MemoryNewList d;
-    new_list::Form_new_list dialog(
-        {d.window, d.Label1, d.Text1, d.Check_info, d.Command1, d.Command2}, w.platform, w.store,
-        *w.form);
+    new_list::Form_new_list dialog(d.controls(), w.platform, w.store, *w.form);
     const std::string index = w.store.readBytes("pemla.dat");
     for (auto _ : state) {
         d.window.show();
@@ -45,32 +37,7 @@ void BM_CreateList(benchmark::State& state) {
     }
 }
 
-struct MemoryExport {
-    ui::memory::MemoryWindow window;
-    ui::memory::MemoryLabel Label1;
-    ui::memory::MemoryDirList Dir1;
-    ui::memory::MemoryDriveList Drive1{{"/"}};
-    ui::memory::MemoryButton Command1;
-    ui::memory::MemoryButton Command2;
-    ui::memory::MemoryCheckBox Checkart;
-    ui::memory::MemoryCheckBox Checkhtml;
-    ui::memory::MemoryCheckBox Checkcounter;
-    ui::memory::MemoryCheckBox Checkdate;
-    ui::memory::MemoryCheckBox Checkline;
-    ui::memory::MemoryCheckBox Check_lastadd;
-    ui::memory::MemoryLabel Label2;
-    ui::memory::MemoryTextBox Text2;
-    ui::memory::MemoryLabel Label3;
-    ui::memory::MemoryComboBox Combo1{true};
-    ui::memory::MemoryCheckBox Check_noinfo;
-    ui::memory::MemoryTextBox Text1;
-
-    exporting::Form_ExportControls controls() {
-        return {window,   Label1,    Dir1,         Drive1,    Command1,     Command2,
-                Checkart, Checkhtml, Checkcounter, Checkdate, Checkline,    Check_lastadd,
-                Label2,   Text2,     Label3,       Combo1,    Check_noinfo, Text1};
-    }
-};
+using MemoryExport = test_support::MemoryFormExport;
 
 // Arguments: entries, article layout, information column, HTML.
 void BM_Export(benchmark::State& state) {

@@ -28,20 +28,6 @@ std::vector<std::string> nineTitles() {
     return titles;
 }
 
-MemoryFormExport::MemoryFormExport(std::vector<std::string> drives) : Drive1(std::move(drives)) {
-    for (ui::memory::Owned* control : std::initializer_list<ui::memory::Owned*>{
-             &Dir1, &Drive1, &Command1, &Command2, &Checkart, &Checkhtml, &Checkcounter, &Checkdate,
-             &Checkline, &Check_lastadd, &Text2, &Combo1, &Check_noinfo, &Text1}) {
-        control->setOwner(&window);
-    }
-}
-
-exporting::Form_ExportControls MemoryFormExport::controls() {
-    return {window,   Label1,    Dir1,         Drive1,    Command1,     Command2,
-            Checkart, Checkhtml, Checkcounter, Checkdate, Checkline,    Check_lastadd,
-            Label2,   Text2,     Label3,       Combo1,    Check_noinfo, Text1};
-}
-
 ExportFixture::ExportFixture(std::vector<std::string> drives)
     : dialog(std::move(drives)), form(dialog.controls(), main.platform, main.store, *main.form) {
     if (const char* old = std::getenv("HOME")) {

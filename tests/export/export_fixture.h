@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "export/form_export.h"
+#include "tests/support/memory_dialogs.h"
 #include "tests/support/memory_form1.h"
 #include "tests/support/temp_folder.h"
 #include "ui/memory/memory_controls.h"
@@ -20,29 +21,7 @@ std::vector<std::string> tenTitles();
 // The same without "Casablanca".
 std::vector<std::string> nineTitles();
 
-struct MemoryFormExport {
-    explicit MemoryFormExport(std::vector<std::string> drives);
-    exporting::Form_ExportControls controls();
-
-    ui::memory::MemoryWindow window;
-    ui::memory::MemoryLabel Label1;
-    ui::memory::MemoryDirList Dir1;
-    ui::memory::MemoryDriveList Drive1;
-    ui::memory::MemoryButton Command1;
-    ui::memory::MemoryButton Command2;
-    ui::memory::MemoryCheckBox Checkart;
-    ui::memory::MemoryCheckBox Checkhtml;
-    ui::memory::MemoryCheckBox Checkcounter;
-    ui::memory::MemoryCheckBox Checkdate;
-    ui::memory::MemoryCheckBox Checkline;
-    ui::memory::MemoryCheckBox Check_lastadd;
-    ui::memory::MemoryLabel Label2;
-    ui::memory::MemoryTextBox Text2;
-    ui::memory::MemoryLabel Label3;
-    ui::memory::MemoryComboBox Combo1{true};
-    ui::memory::MemoryCheckBox Check_noinfo;
-    ui::memory::MemoryTextBox Text1;
-};
+using test_support::MemoryFormExport;
 
 class ExportFixture {
   public:

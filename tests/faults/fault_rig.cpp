@@ -144,27 +144,6 @@ std::string describeStatus(int status) {
     return "exit " + std::to_string(WEXITSTATUS(status));
 }
 
-NewListView::NewListView() {
-    for (ui::memory::Owned* control :
-         std::initializer_list<ui::memory::Owned*>{&Text1, &Check_info, &Command1, &Command2}) {
-        control->setOwner(&window);
-    }
-}
-
-ExportView::ExportView() {
-    for (ui::memory::Owned* control : std::initializer_list<ui::memory::Owned*>{
-             &Dir1, &Drive1, &Command1, &Command2, &Checkart, &Checkhtml, &Checkcounter, &Checkdate,
-             &Checkline, &Check_lastadd, &Text2, &Combo1, &Check_noinfo, &Text1}) {
-        control->setOwner(&window);
-    }
-}
-
-exporting::Form_ExportControls ExportView::controls() {
-    return {window,   Label1,    Dir1,         Drive1,    Command1,     Command2,
-            Checkart, Checkhtml, Checkcounter, Checkdate, Checkline,    Check_lastadd,
-            Label2,   Text2,     Label3,       Combo1,    Check_noinfo, Text1};
-}
-
 Rig::Rig() : Rig(std::string()) {}
 
 Rig::Rig(const std::string& existing)

@@ -14,6 +14,7 @@
 #include "main_window/form1.h"
 #include "new_list/form_new_list.h"
 #include "tests/support/faulty_sys.h"
+#include "tests/support/memory_dialogs.h"
 #include "tests/support/memory_form1.h"
 #include "tests/support/temp_folder.h"
 #include "ui/memory/memory_controls.h"
@@ -84,40 +85,9 @@ int inChild(const std::function<void()>& body, int killAfterMs = -1);
 // The wait status as words: "killed by signal 9", "exit 0".
 std::string describeStatus(int status);
 
-// The new-list dialog's controls.
-struct NewListView {
-    NewListView();
-    ui::memory::MemoryWindow window;
-    ui::memory::MemoryLabel Label1;
-    ui::memory::MemoryTextBox Text1;
-    ui::memory::MemoryCheckBox Check_info;
-    ui::memory::MemoryButton Command1;
-    ui::memory::MemoryButton Command2;
-};
-
-// The export dialog's controls, with "/" as the one drive.
-struct ExportView {
-    ExportView();
-    exporting::Form_ExportControls controls();
-    ui::memory::MemoryWindow window;
-    ui::memory::MemoryLabel Label1;
-    ui::memory::MemoryDirList Dir1;
-    ui::memory::MemoryDriveList Drive1{{"/"}};
-    ui::memory::MemoryButton Command1;
-    ui::memory::MemoryButton Command2;
-    ui::memory::MemoryCheckBox Checkart;
-    ui::memory::MemoryCheckBox Checkhtml;
-    ui::memory::MemoryCheckBox Checkcounter;
-    ui::memory::MemoryCheckBox Checkdate;
-    ui::memory::MemoryCheckBox Checkline;
-    ui::memory::MemoryCheckBox Check_lastadd;
-    ui::memory::MemoryLabel Label2;
-    ui::memory::MemoryTextBox Text2;
-    ui::memory::MemoryLabel Label3;
-    ui::memory::MemoryComboBox Combo1{true};
-    ui::memory::MemoryCheckBox Check_noinfo;
-    ui::memory::MemoryTextBox Text1;
-};
+// The dialogs' controls.
+using NewListView = test_support::MemoryNewList;
+using ExportView = test_support::MemoryFormExport;
 
 // A catalogue folder and an output folder, and the windows on them, every call going through
 // `sys`.

@@ -1,0 +1,50 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "export/form_export.h"
+#include "new_list/form_new_list.h"
+#include "ui/memory/memory_controls.h"
+
+namespace test_support {
+
+// The new-list dialog's controls in memory, each owned by the dialog's window.
+struct MemoryNewList {
+    MemoryNewList();
+    new_list::Form_new_listControls controls();
+
+    ui::memory::MemoryWindow window;
+    ui::memory::MemoryLabel Label1;
+    ui::memory::MemoryTextBox Text1;
+    ui::memory::MemoryCheckBox Check_info;
+    ui::memory::MemoryButton Command1;
+    ui::memory::MemoryButton Command2;
+};
+
+// The export dialog's controls in memory, offering `drives` as volumes.
+struct MemoryFormExport {
+    explicit MemoryFormExport(std::vector<std::string> drives = {"/"});
+    exporting::Form_ExportControls controls();
+
+    ui::memory::MemoryWindow window;
+    ui::memory::MemoryLabel Label1;
+    ui::memory::MemoryDirList Dir1;
+    ui::memory::MemoryDriveList Drive1;
+    ui::memory::MemoryButton Command1;
+    ui::memory::MemoryButton Command2;
+    ui::memory::MemoryCheckBox Checkart;
+    ui::memory::MemoryCheckBox Checkhtml;
+    ui::memory::MemoryCheckBox Checkcounter;
+    ui::memory::MemoryCheckBox Checkdate;
+    ui::memory::MemoryCheckBox Checkline;
+    ui::memory::MemoryCheckBox Check_lastadd;
+    ui::memory::MemoryLabel Label2;
+    ui::memory::MemoryTextBox Text2;
+    ui::memory::MemoryLabel Label3;
+    ui::memory::MemoryComboBox Combo1{true};
+    ui::memory::MemoryCheckBox Check_noinfo;
+    ui::memory::MemoryTextBox Text1;
+};
+
+}  // namespace test_support
