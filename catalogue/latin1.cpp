@@ -44,18 +44,25 @@ bool itemLess(std::string_view a, std::string_view b) {
 }
 
 void sortItems(std::vector<std::string>& items) {
-    std::vector<std::string> folded(items.size());
+    // Every item folded once into one buffer; the sort then compares plain bytes.
+    std::size_t total = 0;
+    for (const auto& item : items) total += item.size();
+    std::string folded;
+    folded.reserve(total);
+    std::vector<std::string_view> keys(items.size());
+    std::vector<std::size_t> starts(items.size());
     for (std::size_t i = 0; i < items.size(); ++i) {
-        folded[i].resize(items[i].size());
-        std::transform(items[i].begin(), items[i].end(), folded[i].begin(), [](char c) {
-            return static_cast<char>(foldByte(static_cast<unsigned char>(c)));
-        });
+        starts[i] = folded.size();
+        for (char c : items[i])
+            folded.push_back(static_cast<char>(foldByte(static_cast<unsigned char>(c))));
     }
+    for (std::size_t i = 0; i < items.size(); ++i)
+        keys[i] = std::string_view(folded).substr(starts[i], items[i].size());
     std::vector<std::size_t> order(items.size());
     for (std::size_t i = 0; i < order.size(); ++i) order[i] = i;
     // Folded texts compare as unsigned bytes, like itemLess; a shorter prefix comes first.
     std::sort(order.begin(), order.end(), [&](std::size_t a, std::size_t b) {
-        const int byFold = folded[a].compare(folded[b]);
+        const int byFold = keys[a].compare(keys[b]);
         if (byFold != 0) return byFold < 0;
         return items[a] < items[b];
     });
