@@ -10,86 +10,59 @@
 namespace catalogue {
 namespace {
 
-// Hands out a number for `first` and keeps the advanced counter text, as one addition does.
-std::string take(std::string& counter, char first) {
-    ArticleNumberResult r = nextArticleNumber(counter, first);
-    counter = r.counterText;
-    return r.number;
-}
-
 TEST(ArticleNumbers, LetterOfTheFirstCharacter) {
-    EXPECT_EQ(articleLetter('A'), 'A');
-    EXPECT_EQ(articleLetter('a'), 'A');
-    EXPECT_EQ(articleLetter('z'), 'Z');
-    for (char c : {'2', ' ', '(', '[', '@', '`', '{', '!', '#', '\0', '\xE9', '\xC9', '\xFF'}) {
+    EXPECT_EQ(std::string({articleLetter('A'), articleLetter('a'), articleLetter('z')}), "AAZ");
+    for (char c : {'2', ' ', '@', '`', '[', '{', '\0', '\xE9', '\xC9', '\xFF'}) {
         EXPECT_EQ(articleLetter(c), '!') << static_cast<int>(c);
     }
 }
 
-TEST(ArticleNumbers, WorkedExample) {
-    std::string counter(kSkeletonCounter);
-    EXPECT_EQ(take(counter, 'A'), "A001");
-    EXPECT_EQ(counter, "A#002\r\n");
-    EXPECT_EQ(take(counter, 'B'), "B001");
-    EXPECT_EQ(counter, "A#002\r\nB#002\r\n");
-    EXPECT_EQ(take(counter, '2'), "!001");
-    EXPECT_EQ(counter, "A#002\r\nB#002\r\n!#002\r\n");
-    EXPECT_EQ(take(counter, 'a'), "A002");
-    EXPECT_EQ(take(counter, '\xE9'), "!002");  // é files under "!"
-    EXPECT_EQ(take(counter, 'b'), "B002");
-    EXPECT_EQ(counter, "A#003\r\nB#003\r\n!#003\r\n");
-}
-
-TEST(ArticleNumbers, ThreeTitlesOfANewLetter) {
-    std::string counter(kSkeletonCounter);
-    EXPECT_EQ(take(counter, 'C'), "C001");
-    EXPECT_EQ(take(counter, 'c'), "C002");
-    EXPECT_EQ(take(counter, 'C'), "C003");
-    EXPECT_EQ(counter, "A#001\r\nC#004\r\n");
-}
-
-TEST(ArticleNumbers, CounterFilesWithEmptyLinesOrNoLines) {
-    std::string counter = "A#005\r\n\r\nB#003\r\n\r\n";
-    EXPECT_EQ(take(counter, 'B'), "B003");
-    EXPECT_EQ(counter, "A#005\r\n\r\nB#004\r\n\r\n");
-    EXPECT_EQ(take(counter, 'Q'), "Q001");
-    EXPECT_EQ(counter, "A#005\r\n\r\nB#004\r\n\r\nQ#002\r\n");
-
-    counter = "";
-    EXPECT_EQ(take(counter, 'K'), "K001");
-    EXPECT_EQ(counter, "K#002\r\n");
-    counter = "A#009";  // a last line still without its CR LF
-    EXPECT_EQ(take(counter, 'A'), "A009");
-    EXPECT_EQ(counter.substr(0, 5), "A#010");
-    EXPECT_EQ(take(counter, 'D'), "D001");
-    EXPECT_EQ(counter, "A#010\r\nD#002\r\n");
-    counter = "A#099\r\n";
-    EXPECT_EQ(take(counter, 'A'), "A099");
-    EXPECT_EQ(counter, "A#100\r\n");
-}
-
-TEST(ArticleNumbers, NineNinetyNineIsTheLastNumber) {
-    std::string counter = "A#998\r\nB#005\r\n";
-    EXPECT_EQ(take(counter, 'A'), "A998");
-    EXPECT_EQ(counter, "A#999\r\nB#005\r\n");
-    EXPECT_EQ(counterProblem(counter, 'A'), CounterProblem::None);
-    EXPECT_EQ(take(counter, 'A'), "A999");
-    EXPECT_EQ(counter, "A#000\r\nB#005\r\n");
-    EXPECT_EQ(counterProblem(counter, 'A'), CounterProblem::Exhausted);
-    EXPECT_THROW(nextArticleNumber(counter, 'a'), std::invalid_argument);
-    // Other letters go on; A's used-up record stays as it is.
-    EXPECT_EQ(counterProblem(counter, 'B'), CounterProblem::None);
-    EXPECT_EQ(take(counter, 'B'), "B005");
-    EXPECT_EQ(counter, "A#000\r\nB#006\r\n");
-}
-
-TEST(ArticleNumbers, DamagedDigits) {
-    for (std::string_view text : {"A#0x1\r\n", "A#12\r\n", "A#", "A", "A# 12\r\n", "A#-12\r\n"}) {
-        EXPECT_EQ(counterProblem(text, 'A'), CounterProblem::Damaged) << text;
-        EXPECT_THROW(nextArticleNumber(text, 'A'), std::invalid_argument) << text;
-        EXPECT_EQ(counterProblem(text, 'B'), CounterProblem::None) << text;
+// Each case hands out numbers for a run of first characters, one addition after another, and
+// ends with the counter text they leave.
+TEST(ArticleNumbers, NumbersAndCounterTextsByteForByte) {
+    struct Case {
+        std::string counter;
+        std::string firsts;
+        std::string numbers;
+        std::string after;
+    };
+    const Case cases[] = {
+        // The worked example; é files under "!".
+        {std::string(kSkeletonCounter),
+         "AB2a\xE9"
+         "b",
+         "A001 B001 !001 A002 !002 B002 ", "A#003\r\nB#003\r\n!#003\r\n"},
+        {std::string(kSkeletonCounter), "CcC", "C001 C002 C003 ", "A#001\r\nC#004\r\n"},
+        {"A#005\r\n\r\nB#003\r\n\r\n", "BQ", "B003 Q001 ", "A#005\r\n\r\nB#004\r\n\r\nQ#002\r\n"},
+        {"", "K", "K001 ", "K#002\r\n"},
+        {"A#009", "AD", "A009 D001 ", "A#010\r\nD#002\r\n"},  // last line without its CR LF
+        {"A#099\r\n", "A", "A099 ", "A#100\r\n"},
+        // 999 is the last number: the record then reads 000, other letters go on.
+        {"A#998\r\nB#005\r\n", "AAB", "A998 A999 B005 ", "A#000\r\nB#006\r\n"},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.counter + " + " + c.firsts);
+        std::string counter = c.counter, numbers;
+        for (char first : c.firsts) {
+            EXPECT_EQ(counterProblem(counter, articleLetter(first)), CounterProblem::None);
+            ArticleNumberResult r = nextArticleNumber(counter, first);
+            counter = r.counterText;
+            numbers += r.number + " ";
+        }
+        EXPECT_EQ(numbers, c.numbers);
+        EXPECT_EQ(counter, c.after);
     }
-    EXPECT_EQ(counterProblem("", 'A'), CounterProblem::None);
+}
+
+TEST(ArticleNumbers, UsedUpAndDamagedRecordsAreRefusedForTheirLetterOnly) {
+    for (std::string_view text :
+         {"A#000\r\nB#006\r\n", "A#0x1\r\n", "A#12\r\n", "A#", "A", "A# 12\r\n", "A#-12\r\n"}) {
+        SCOPED_TRACE(text);
+        EXPECT_EQ(counterProblem(text, 'A'),
+                  text.starts_with("A#000") ? CounterProblem::Exhausted : CounterProblem::Damaged);
+        EXPECT_THROW(nextArticleNumber(text, 'a'), std::invalid_argument);
+        EXPECT_EQ(counterProblem(text, 'B'), CounterProblem::None);
+    }
     EXPECT_EQ(counterProblem("A#001\r\n", '!'), CounterProblem::None);
 }
 

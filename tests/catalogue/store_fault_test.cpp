@@ -18,10 +18,8 @@
 namespace catalogue {
 namespace {
 
-using test_support::CrashStop;
 using test_support::FaultySys;
 using test_support::SysCall;
-using test_support::TempFolder;
 
 // Every file of the folder by name, temporary files and the journal included.
 using Files = std::map<std::string, std::string>;
@@ -36,8 +34,11 @@ const Files kOld = {
 
 struct Row {
     const char* name;
-    std::vector<std::pair<std::string, std::optional<std::string>>> changes;  // nothing: delete
+    std::map<std::string, std::optional<std::string>> changes;  // nothing: delete
 };
+void PrintTo(const Row& row, std::ostream* out) {
+    *out << row.name;
+}
 
 const Row kRows[] = {
     {"ThreeWritesAndADeletion",
@@ -50,36 +51,27 @@ const Row kRows[] = {
     {"OneDeletion", {{"Rock.inf", std::nullopt}}},
 };
 
-void PrintTo(const Row& row, std::ostream* out) {
-    *out << row.name;
-}
-
-Files newFiles(const Row& row) {
-    Files files = kOld;
-    for (const auto& [name, content] : row.changes) {
-        if (content) {
-            files[name] = *content;
-        } else {
-            files.erase(name);
-        }
-    }
-    return files;
-}
-
-void commit(Store& store, const Row& row) {
-    Transaction t = store.begin();
-    for (const auto& [name, content] : row.changes) {
-        if (content) {
-            t.write(name, *content);
-        } else {
-            t.remove(name);
-        }
-    }
-    t.commit();
-}
-
 class CommitFaults : public ::testing::TestWithParam<Row> {
   protected:
+    void SetUp() override {
+        newSet = kOld;
+        for (const auto& [name, content] : GetParam().changes) {
+            if (content)
+                newSet[name] = *content;
+            else
+                newSet.erase(name);
+        }
+    }
+    void commit(Store& store) {
+        Transaction t = store.begin();
+        for (const auto& [name, content] : GetParam().changes) {
+            if (content)
+                t.write(name, *content);
+            else
+                t.remove(name);
+        }
+        t.commit();
+    }
     void reset() {
         for (const auto& item : std::filesystem::directory_iterator(folder.path())) {
             std::filesystem::remove(item.path());
@@ -89,102 +81,82 @@ class CommitFaults : public ::testing::TestWithParam<Row> {
     Files state() const {
         Files files;
         for (const auto& item : std::filesystem::directory_iterator(folder.path())) {
-            const std::string name = item.path().filename().string();
-            files[name] = folder.get(name);
+            files[item.path().filename()] = folder.get(item.path().filename().string());
         }
         return files;
     }
-    // Prints the fault points covered, per kind, to the log and the test report.
+    // Prints the points covered, per kind, to the log and the test report.
     int report(const std::string& what, const std::map<std::string, int>& points) {
         int total = 0;
         std::string line;
-        for (const auto& [kind, n] : points) {
-            total += n;
-            line += " " + kind + "=" + std::to_string(n);
-        }
+        for (const auto& [kind, n] : points) line += " " + kind + "=" + std::to_string(n);
+        for (const auto& item : points) total += item.second;
         std::cout << GetParam().name << ": " << total << " " << what << " covered:" << line << "\n";
         RecordProperty(what, total);
         return total;
     }
 
-    TempFolder folder;
+    test_support::TempFolder folder;
+    Files newSet;
 };
 
-TEST_P(CommitFaults, AFailingCallLeavesTheOldOrTheNewSet) {
-    const Row& row = GetParam();
-    const Files newSet = newFiles(row);
-    std::map<std::string, int> points;
-    for (SysCall kind : test_support::kAllSysCalls) {
+// Each system call of the commit fails in turn (the kinds of kAllSysCalls), then the commit is
+// stopped dead at each step in turn (the last round).
+TEST_P(CommitFaults, AFailingCallOrACrashLeavesTheOldOrTheNewSet) {
+    std::map<std::string, int> points, outcomes;
+    for (std::size_t round = 0; round <= test_support::kAllSysCalls.size(); ++round) {
+        const bool crash = round == test_support::kAllSysCalls.size();
+        const SysCall kind = crash ? SysCall::Open : test_support::kAllSysCalls[round];
         const int errnum = kind == SysCall::Write ? ENOSPC : EIO;
         for (int n = 1;; ++n) {
-            SCOPED_TRACE(std::string(sysCallName(kind)) + " #" + std::to_string(n));
+            SCOPED_TRACE(crash ? "crash at step " + std::to_string(n)
+                               : std::string(sysCallName(kind)) + " #" + std::to_string(n));
             reset();
             FaultySys sys;
             sys.capWrites(16);  // several writes per file, so a write can fail half-way
-            sys.failAt(kind, n, errnum);
+            if (crash)
+                sys.crashAt(n);
+            else
+                sys.failAt(kind, n, errnum);
             Store store(folder.path(), sys);
             bool threw = false;
             try {
-                commit(store, row);
+                commit(store);
             } catch (const CatalogueError& e) {
                 threw = true;
+                EXPECT_FALSE(crash) << "a crash taken for a failure";
                 EXPECT_EQ(e.reason(), std::strerror(errnum));
                 EXPECT_FALSE(e.file().empty());
+            } catch (const test_support::CrashStop&) {
+                EXPECT_TRUE(crash);
             }
             if (!sys.fired()) {
                 EXPECT_FALSE(threw);
                 EXPECT_EQ(state(), newSet);
                 break;
             }
-            ++points[sysCallName(kind)];
-            // Whole either way, and no staged file or journal left behind even before recovery.
-            EXPECT_EQ(state(), threw ? kOld : newSet) << (threw ? "threw" : "returned");
-            Store(folder.path()).recover();
-            EXPECT_EQ(state(), threw ? kOld : newSet) << (threw ? "threw" : "returned");
-            commit(store, row);  // the same change again, on the same store
+            // A failure leaves a whole set, with no staged file or journal, even before recovery.
+            if (!crash) {
+                EXPECT_EQ(state(), threw ? kOld : newSet) << (threw ? "threw" : "returned");
+            }
+            Store real(folder.path());
+            real.recover();
+            const Files after = state();
+            if (crash && (after == kOld || after == newSet)) {
+                ++outcomes[after == kOld ? "all old" : "all new"];
+            } else if (crash) {
+                ADD_FAILURE() << "mixed set after recovery";
+            } else {
+                ++points[sysCallName(kind)];
+                EXPECT_EQ(after, threw ? kOld : newSet) << (threw ? "threw" : "returned");
+            }
+            // The same change again, on the same store unless that one was stopped dead.
+            commit(crash ? real : store);
             EXPECT_EQ(state(), newSet);
         }
     }
     // At least the staging or removal and the folder flush of every file were hit.
-    EXPECT_GE(report("fault points", points), static_cast<int>(4 * row.changes.size()));
-}
-
-TEST_P(CommitFaults, ACrashAtAnyStepRecoversToTheOldOrTheNewSet) {
-    const Row& row = GetParam();
-    const Files newSet = newFiles(row);
-    std::map<std::string, int> outcomes;
-    for (int step = 1;; ++step) {
-        SCOPED_TRACE("crash at step " + std::to_string(step));
-        reset();
-        FaultySys sys;
-        sys.capWrites(16);
-        sys.crashAt(step);
-        {
-            Store store(folder.path(), sys);
-            EXPECT_NO_THROW({
-                try {
-                    commit(store, row);
-                } catch (const CrashStop&) {
-                }
-            });
-        }
-        if (!sys.fired()) {
-            EXPECT_EQ(state(), newSet);
-            break;
-        }
-        Store real(folder.path());
-        real.recover();
-        const Files after = state();
-        if (after == kOld) {
-            ++outcomes["all old"];
-        } else if (after == newSet) {
-            ++outcomes["all new"];
-        } else {
-            ADD_FAILURE() << "mixed set after recovery";
-        }
-        commit(real, row);
-        EXPECT_EQ(state(), newSet);
-    }
+    EXPECT_GE(report("fault points", points), static_cast<int>(4 * GetParam().changes.size()));
     report("crash points", outcomes);
     EXPECT_GT(outcomes["all old"], 0);
     EXPECT_GT(outcomes["all new"], 0);

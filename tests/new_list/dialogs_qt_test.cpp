@@ -2,7 +2,6 @@
 // the main window is disabled while a dialog is open and usable again however it closes.
 #include <gtest/gtest.h>
 
-#include <QCheckBox>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QMessageBox>
@@ -23,52 +22,32 @@
 
 namespace {
 
-// The four windows as the program builds them, on one catalogue folder.
-struct QtWindows {
-    explicit QtWindows(const test_support::TempFolder& folder)
-        : store(folder.path()),
-          form(view.controls(), platform, store),
-          newListView(view.widget()),
-          newList(newListView.controls(), platform, store, form),
-          searchView(view.widget()),
-          search(searchView.controls(), platform, store, form) {
-        form.setDialogs({&newListView.controls().window, nullptr, &searchView.controls().window});
-        view.controls().window.show();
-    }
-
-    void click(QPushButton* button) { QTest::mouseClick(button, Qt::LeftButton); }
-    void select(QListWidget* list, const QString& text) {
-        const auto found = list->findItems(text, Qt::MatchExactly);
-        ASSERT_EQ(found.size(), 1) << text.toStdString();
-        QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
-                          list->visualItemRect(found.front()).center());
-    }
-
-    catalogue::Store store;
-    ui::qt::QtPlatform platform;
-    app::MainWindowView view;
-    main_window::Form1 form;
-    app::NewListView newListView;
-    new_list::Form_new_list newList;
-    app::SearchView searchView;
-    search::Form_searchart search;
-};
-
-// Records every message box and answers OK; cleared when the test ends.
+// Records every message box's text and answers OK; cleared when the test ends.
 struct BoxRecorder {
     BoxRecorder() {
         ui::qt::QtPlatform::setAnswerHook([this](QMessageBox& box) {
             texts.push_back(box.text());
-            titles.push_back(box.windowTitle());
             return ui::Answer::Ok;
         });
     }
     ~BoxRecorder() { ui::qt::QtPlatform::setAnswerHook(nullptr); }
     QStringList texts;
-    QStringList titles;
 };
 
-void putCatalogue(const test_support::TempFolder& folder) {
+// A dialog is a window of its own above the main window, not one of its children, so that
+// disabling the main window leaves the dialog usable.
+void expectOwnWindowAbove(QWidget* dialog, QWidget* main) {
+    EXPECT_TRUE(dialog->isVisible() && dialog->isWindow() && dialog->isEnabled());
+    EXPECT_EQ(dialog->parentWidget(), nullptr);
+    ASSERT_NE(dialog->windowHandle(), nullptr);
+    EXPECT_EQ(dialog->windowHandle()->transientParent(), main->windowHandle());
+    EXPECT_FALSE(main->isEnabled());
+}
+
+// Creating a list and searching through these dialogs on Qt is the end-to-end test's part; here
+// the opening, the keys they ignore and the closing by the close box.
+TEST(DialogsOnQt, EachDialogDisablesTheMainWindowUntilItCloses) {
+    test_support::TempFolder folder;
     folder.put("type.dat", "Types\r\nMusic CD\r\n");
     folder.put("information.dat", "Information\r\nOriginal\r\n");
     folder.put("pemla.dat", "Pop\r\n");
@@ -76,108 +55,63 @@ void putCatalogue(const test_support::TempFolder& folder) {
     folder.put("Pop.art", "Abba Gold#*\\A001\r\n");
     folder.put("Pop.arn", "A#002\r\n");
     folder.put("Pop.inf", " 1 \r\n");
-}
-
-// A dialog is a window of its own above the main window, not one of its children, so that
-// disabling the main window leaves the dialog usable.
-void expectOwnWindowAbove(QWidget* dialog, QWidget* main) {
-    EXPECT_TRUE(dialog->isVisible());
-    EXPECT_TRUE(dialog->isWindow());
-    EXPECT_EQ(dialog->parentWidget(), nullptr);
-    ASSERT_NE(dialog->windowHandle(), nullptr);
-    EXPECT_EQ(dialog->windowHandle()->transientParent(), main->windowHandle());
-    EXPECT_FALSE(main->isEnabled());
-    EXPECT_TRUE(dialog->isEnabled());
-}
-
-TEST(DialogsOnQt, NewListDialogDisablesTheMainWindowUntilItCloses) {
-    test_support::TempFolder folder;
-    putCatalogue(folder);
     BoxRecorder boxes;
-    QtWindows w(folder);
-    QWidget* dialog = w.newListView.widget();
+    // The four windows as the program builds them.
+    catalogue::Store store(folder.path());
+    ui::qt::QtPlatform platform;
+    app::MainWindowView view;
+    main_window::Form1 form(view.controls(), platform, store);
+    app::NewListView newListView(view.widget());
+    new_list::Form_new_list newListForm(newListView.controls(), platform, store, form);
+    app::SearchView searchView(view.widget());
+    search::Form_searchart searchForm(searchView.controls(), platform, store, form);
+    form.setDialogs({&newListView.controls().window, nullptr, &searchView.controls().window});
+    view.controls().window.show();
+    const auto click = [](QPushButton* button) { QTest::mouseClick(button, Qt::LeftButton); };
+    QWidget* newList = newListView.widget();
+    QWidget* search = searchView.widget();
 
-    w.click(w.view.Command_create);
-    expectOwnWindowAbove(dialog, w.view.widget());
-    EXPECT_EQ(dialog->windowTitle(), QStringLiteral("Create new list"));
-    EXPECT_EQ(dialog->focusWidget(), w.newListView.Text1);
-    EXPECT_TRUE(w.newListView.Check_info->isChecked());
-    EXPECT_EQ(w.newListView.Text1->maxLength(), 26);
-
+    click(view.Command_create);
+    expectOwnWindowAbove(newList, view.widget());
+    EXPECT_EQ(newList->windowTitle(), QStringLiteral("Create new list"));
+    EXPECT_EQ(newList->focusWidget(), newListView.Text1);
+    EXPECT_EQ(newListView.Text1->maxLength(), 26);
     // Enter and Escape do nothing, in the name box and on a focused button alike.
-    QTest::keyClicks(w.newListView.Text1, QStringLiteral("Jazz"));
-    QTest::keyClick(w.newListView.Text1, Qt::Key_Return);
-    QTest::keyClick(w.newListView.Text1, Qt::Key_Escape);
-    w.newListView.Command1->setFocus();
-    QTest::keyClick(w.newListView.Command1, Qt::Key_Return);
-    QTest::keyClick(w.newListView.Command1, Qt::Key_Enter);
-    QTest::keyClick(w.newListView.Command2, Qt::Key_Escape);
-    EXPECT_TRUE(dialog->isVisible());
+    QTest::keyClicks(newListView.Text1, QStringLiteral("Jazz"));
+    QTest::keyClick(newListView.Text1, Qt::Key_Return);
+    QTest::keyClick(newListView.Text1, Qt::Key_Escape);
+    newListView.Command1->setFocus();
+    QTest::keyClick(newListView.Command1, Qt::Key_Return);
+    QTest::keyClick(newListView.Command1, Qt::Key_Enter);
+    QTest::keyClick(newListView.Command2, Qt::Key_Escape);
+    EXPECT_TRUE(newList->isVisible());
+    newList->close();  // the close box
+    EXPECT_TRUE(!newList->isVisible() && view.widget()->isEnabled());
     EXPECT_EQ(folder.get("pemla.dat"), "Pop\r\n");
 
-    dialog->close();  // the close box
-    EXPECT_FALSE(dialog->isVisible());
-    EXPECT_TRUE(w.view.widget()->isEnabled());
-    EXPECT_FALSE(folder.has("Jazz.dat"));
-
-    // Opened again it starts empty; "Create" makes the list and closes.
-    w.click(w.view.Command_create);
-    EXPECT_EQ(w.newListView.Text1->text(), QString());
-    QTest::keyClicks(w.newListView.Text1, QStringLiteral("Jazz"));
-    QTest::mouseClick(w.newListView.Check_info, Qt::LeftButton);
-    w.click(w.newListView.Command1);
-    EXPECT_FALSE(dialog->isVisible());
-    EXPECT_TRUE(w.view.widget()->isEnabled());
-    EXPECT_EQ(folder.get("pemla.dat"), "Pop\r\nJazz\r\n");
-    EXPECT_EQ(folder.get("Jazz.inf"), " 0 \r\n");
-    EXPECT_EQ(w.view.List_list->count(), 2);
-
-    // A refusal is told in a box, and the dialog closes all the same.
-    w.click(w.view.Command_create);
-    QTest::keyClicks(w.newListView.Text1, QStringLiteral("pop"));
-    w.click(w.newListView.Command1);
-    EXPECT_EQ(boxes.texts, QStringList{QStringLiteral("A list with that name already exist!")});
-    EXPECT_EQ(boxes.titles, QStringList{QStringLiteral("Error")});
-    EXPECT_FALSE(dialog->isVisible());
-    EXPECT_TRUE(w.view.widget()->isEnabled());
-}
-
-TEST(DialogsOnQt, SearchDialogDisablesTheMainWindowUntilItCloses) {
-    test_support::TempFolder folder;
-    putCatalogue(folder);
-    BoxRecorder boxes;
-    QtWindows w(folder);
-    QWidget* dialog = w.searchView.widget();
-
-    w.select(w.view.List_list, QStringLiteral("Pop"));
-    w.click(w.view.Command_search);
-    expectOwnWindowAbove(dialog, w.view.widget());
-    EXPECT_EQ(dialog->windowTitle(), QStringLiteral("Search article number"));
-    EXPECT_EQ(dialog->focusWidget(), w.searchView.Text1);
-
-    QTest::keyClicks(w.searchView.Text1, QStringLiteral("a0011"));
-    EXPECT_EQ(w.searchView.Text1->text(), QStringLiteral("a001"));
-    QTest::keyClick(w.searchView.Text1, Qt::Key_Return);
-    QTest::keyClick(w.searchView.Text1, Qt::Key_Escape);
-    EXPECT_EQ(w.searchView.Text2->text(), QString()) << "Enter does not search";
-    EXPECT_TRUE(dialog->isVisible());
-    w.click(w.searchView.Command_search);
-    EXPECT_EQ(w.searchView.Text2->text(), QStringLiteral("Abba Gold"));
-    EXPECT_TRUE(boxes.texts.isEmpty());
-
-    dialog->close();  // the close box
-    EXPECT_FALSE(dialog->isVisible());
-    EXPECT_TRUE(w.view.widget()->isEnabled());
+    QTest::mouseClick(view.List_list->viewport(), Qt::LeftButton, {},
+                      view.List_list->visualItemRect(view.List_list->item(0)).center());
+    click(view.Command_search);
+    expectOwnWindowAbove(search, view.widget());
+    EXPECT_EQ(search->windowTitle(), QStringLiteral("Search article number"));
+    EXPECT_EQ(search->focusWidget(), searchView.Text1);
+    QTest::keyClicks(searchView.Text1, QStringLiteral("a0011"));
+    EXPECT_EQ(searchView.Text1->text(), QStringLiteral("a001"));
+    QTest::keyClick(searchView.Text1, Qt::Key_Return);
+    QTest::keyClick(searchView.Text1, Qt::Key_Escape);
+    EXPECT_TRUE(search->isVisible());
+    EXPECT_EQ(searchView.Text2->text(), QString()) << "Enter does not search";
+    search->close();  // the close box
+    EXPECT_TRUE(!search->isVisible() && view.widget()->isEnabled());
 
     // Without its article file the list cannot be searched: the box names the file, and the
     // dialog never stays open over a disabled main window.
     std::filesystem::remove(folder.file("Pop.art"));
-    w.click(w.view.Command_search);
+    click(view.Command_search);
     ASSERT_EQ(boxes.texts.size(), 1);
     EXPECT_TRUE(boxes.texts[0].contains(QStringLiteral("\"Pop.art\"")))
         << boxes.texts[0].toStdString();
-    EXPECT_FALSE(dialog->isVisible());
-    EXPECT_TRUE(w.view.widget()->isEnabled());
+    EXPECT_TRUE(!search->isVisible() && view.widget()->isEnabled());
 }
 
 }  // namespace

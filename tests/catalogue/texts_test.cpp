@@ -1,0 +1,103 @@
+// The line rule of the catalogue's files, their numbers, and Latin-1 letter case.
+#include <gtest/gtest.h>
+
+#include <climits>
+#include <string>
+#include <vector>
+
+#include "catalogue/file_text.h"
+#include "catalogue/latin1.h"
+
+namespace catalogue {
+namespace {
+
+// The lines of `bytes` joined with '|', to compare a whole split at once.
+std::string lines(std::string_view bytes) {
+    std::string out;
+    for (std::string_view line : splitLines(bytes)) out += std::string(line) + "|";
+    return out;
+}
+
+TEST(FileText, LineRuleEndsAtCrAndSkipsOneLf) {
+    EXPECT_EQ(lines(""), "");
+    EXPECT_EQ(lines("a\r\nb\r\n"), "a|b|");
+    EXPECT_EQ(lines("a\r\nb"), "a|b|");  // the end of the file ends the last line
+    EXPECT_EQ(lines("a\rb\r"), "a|b|");
+    EXPECT_EQ(lines("x\r\r\ny"), "x||y|");
+    EXPECT_EQ(lines("\r\n\r\n"), "||");
+    // A lone LF is data, and only one LF after a CR belongs to the line end.
+    EXPECT_EQ(lines("a\nb"), "a\nb|");
+    EXPECT_EQ(lines("a\r\n\nb"), "a|\nb|");
+    EXPECT_EQ(lines("\xE9t\xE9\r\n"), "\xE9t\xE9|");  // bytes pass unchanged
+}
+
+TEST(FileText, TextReadAndWrittenEndsEveryLineWithCrLf) {
+    EXPECT_EQ(toFileText(""), "");
+    EXPECT_EQ(toFileText("a\rb"), "a\r\nb\r\n");
+    EXPECT_EQ(toFileText("a\r\n\r\n"), "a\r\n\r\n");
+    EXPECT_EQ(toFileText("a\r\n\nb"), "a\r\n\nb\r\n");
+    EXPECT_EQ(toFileText("\r"), "\r\n");
+    EXPECT_EQ(forWriting(""), "");
+    EXPECT_EQ(forWriting("a"), "a\r\n");
+    EXPECT_EQ(forWriting("a\r\nb"), "a\r\nb\r\n");
+    EXPECT_EQ(forWriting("a\r\n\r\n"), "a\r\n\r\n");  // an existing empty line stays, none added
+}
+
+TEST(FileText, NumbersReadAndWritten) {
+    EXPECT_EQ(firstNumber(" 1 "), 1);
+    EXPECT_EQ(firstNumber(" 0 \r\n"), 0);
+    EXPECT_EQ(firstNumber("-3"), -3);
+    EXPECT_EQ(firstNumber("+5"), 5);
+    EXPECT_EQ(firstNumber("\t12abc"), 12);
+    EXPECT_EQ(firstNumber(std::to_string(LONG_MAX)), LONG_MAX);
+    for (std::string bad : {"", "   ", "abc", "- 3", "\r\n1", "99999999999999999999"}) {
+        EXPECT_EQ(firstNumber(bad), std::nullopt) << bad;
+    }
+    EXPECT_EQ(firstNumber(std::to_string(LONG_MAX) + "0"), std::nullopt);
+    EXPECT_EQ(leadingNumber("  7 x"), 7);
+    EXPECT_EQ(leadingNumber("x7"), 0);
+
+    EXPECT_EQ(fileNumber(1) + fileNumber(0) + fileNumber(-3), " 1  0 -3 ");
+    EXPECT_EQ(labelNumber(32767) + labelNumber(0) + labelNumber(-3), " 32767 0-3");
+}
+
+constexpr auto npos = std::string_view::npos;
+
+TEST(Latin1, FoldsAsciiAndAccentedLettersOnly) {
+    EXPECT_TRUE(equalsIgnoreCase("Star Wars", "sTAR wARS"));
+    EXPECT_TRUE(equalsIgnoreCase("\xC9t\xC9", "\xE9T\xE9"));  // ÉtÉ / éTé
+    EXPECT_TRUE(equalsIgnoreCase("\xC0\xDE", "\xE0\xFE"));  // À Þ / à þ, the ends of the range
+    EXPECT_TRUE(equalsIgnoreCase("", ""));
+    // × ÷ are no letter pair, ß ÿ have no capital here, @ ` and [ { are 0x20 apart but no letters.
+    for (auto [a, b] :
+         {std::pair{"\xD7", "\xF7"}, {"\xDF", "\xFF"}, {"@", "`"}, {"[", "{"}, {"abc", "abcD"}}) {
+        EXPECT_FALSE(equalsIgnoreCase(a, b)) << a << " " << b;
+    }
+    EXPECT_EQ(upperByte('a'), 'A');
+    EXPECT_EQ(upperByte(0xE0), 0xC0);
+    EXPECT_EQ(upperByte(0xFE), 0xDE);
+    for (int same : {0xFF, 0xF7, 0xDF, 0xC9, 0x7B, 0x60}) EXPECT_EQ(upperByte(same), same) << same;
+}
+
+TEST(Latin1, FindIgnoreCase) {
+    EXPECT_EQ(findIgnoreCase("x <|?CAF\xC9\r", "<|?caf\xE9\r"), 2u);
+    EXPECT_EQ(findIgnoreCase("abcABC", "abc", 1), 3u);
+    EXPECT_EQ(findIgnoreCase("abc", "ABC", 3), npos);
+    EXPECT_EQ(findIgnoreCase("abc", "", 2), 2u);
+    EXPECT_EQ(findIgnoreCase("abc", "a", 4), npos);
+    EXPECT_EQ(findIgnoreCase("\xD7\xF7", "\xF7\xF7"), npos);
+    EXPECT_EQ(findIgnoreCase("ab", "abc"), npos);
+    // A long text of near misses still finds the one real occurrence at its end.
+    EXPECT_EQ(findIgnoreCase(std::string(100000, 'a') + "aAB", "AAB"), 100000u);
+}
+
+// Ties and accented letters are held to by the list-box contract suite; here a prefix.
+TEST(Latin1, ItemOrderPutsAPrefixFirst) {
+    EXPECT_TRUE(itemLess("ab", "ABC") && !itemLess("ABC", "ab") && !itemLess("abc", "abc"));
+    std::vector<std::string> items = {"ABC", "abc", "ab"};
+    sortItems(items);
+    EXPECT_EQ(items, (std::vector<std::string>{"ab", "ABC", "abc"}));
+}
+
+}  // namespace
+}  // namespace catalogue
