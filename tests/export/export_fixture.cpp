@@ -4,46 +4,45 @@
 
 #include <cstdlib>
 #include <fstream>
-#include <sstream>
+#include <iterator>
 
 namespace export_test {
 
 std::string data(const std::string& name) {
     std::ifstream in(std::string(PEMLA_EXPORT_DATA) + "/" + name, std::ios::binary);
     if (!in) throw std::runtime_error("missing test data " + name);
-    std::ostringstream bytes;
-    bytes << in.rdbuf();
-    return bytes.str();
+    return {std::istreambuf_iterator<char>(in), {}};
 }
 
-std::vector<std::string> tenTitles() {
-    return {"Alien", "amelie", "Blade Runner", "Casablanca",
-            "Heat",  "Star",   "Star Wars",    "The Lord of the Rings Trilogy",
-            "Wars",  "Zorro"};
-}
-
-std::vector<std::string> nineTitles() {
-    std::vector<std::string> titles = tenTitles();
-    titles.erase(titles.begin() + 3);
+std::vector<std::string> movieTitles(bool withCasablanca) {
+    std::vector<std::string> titles = {"Alien",
+                                       "amelie",
+                                       "Blade Runner",
+                                       "Heat",
+                                       "Star",
+                                       "Star Wars",
+                                       "The Lord of the Rings Trilogy",
+                                       "Wars",
+                                       "Zorro"};
+    if (withCasablanca) titles.insert(titles.begin() + 3, "Casablanca");
     return titles;
+}
+
+std::string settings(const std::vector<std::string>& lines) {
+    std::string text;
+    for (const std::string& line : lines) text += line + "\r\n";
+    return text;
 }
 
 ExportFixture::ExportFixture(std::vector<std::string> drives)
     : dialog(std::move(drives)), form(dialog.controls(), main.platform, main.store, *main.form) {
-    if (const char* old = std::getenv("HOME")) {
-        hadHome_ = true;
-        oldHome_ = old;
-    }
+    if (const char* old = std::getenv("HOME")) oldHome_ = old;
     ::setenv("HOME", home.path().c_str(), 1);
     main.form->setDialogs({nullptr, &dialog.window, nullptr});
 }
 
 ExportFixture::~ExportFixture() {
-    if (hadHome_) {
-        ::setenv("HOME", oldHome_.c_str(), 1);
-    } else {
-        ::unsetenv("HOME");
-    }
+    ::setenv("HOME", oldHome_.c_str(), 1);
 }
 
 void ExportFixture::openMovies(const std::string& flag) {
@@ -55,12 +54,6 @@ void ExportFixture::openMovies(const std::string& flag) {
 
 void ExportFixture::openDialog() {
     ASSERT_TRUE(main.view.Command_export.click());
-}
-
-std::string ExportFixture::settings(const std::vector<std::string>& lines) {
-    std::string text;
-    for (const std::string& line : lines) text += line + "\r\n";
-    return text;
 }
 
 }  // namespace export_test

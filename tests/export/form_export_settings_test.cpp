@@ -1,90 +1,80 @@
 // The export dialog's opening and closing on in-memory controls: loading, falling back to the
 // defaults, drives, and saving on every closing.
 #include <gtest/gtest.h>
-#include <sys/stat.h>
 
 #include <filesystem>
+#include <functional>
+#include <tuple>
 
 #include "tests/export/export_fixture.h"
 
 namespace {
 
 using export_test::ExportFixture;
-using ui::Answer;
+using export_test::settings;
 
 std::string defaultsFor(const std::string& folder) {
-    return folder + "\r\n0\r\n0\r\n0\r\n0\r\n0\r\n0\r\n10\r\nTop\r\n";
+    return settings({folder, "0", "0", "0", "0", "0", "0", "10", "Top"});
+}
+
+// What the dialog shows, written as a settings file with plain check values.
+std::string shown(ExportFixture& f) {
+    std::vector<std::string> lines = {f.dialog.Dir1.path()};
+    for (auto* box : {&f.dialog.Checkart, &f.dialog.Checkhtml, &f.dialog.Checkcounter,
+                      &f.dialog.Checkdate, &f.dialog.Checkline, &f.dialog.Check_lastadd}) {
+        lines.push_back(std::to_string(box->value()));
+    }
+    lines.push_back(f.dialog.Text2.text());
+    lines.push_back(f.dialog.Combo1.text());
+    return settings(lines);
 }
 
 void expectDefaults(ExportFixture& f, const std::string& folder) {
     EXPECT_EQ(f.main.folder.get("export.dat"), defaultsFor(folder));
-    EXPECT_EQ(f.dialog.Dir1.path(), folder);
-    for (auto* box : {&f.dialog.Checkart, &f.dialog.Checkhtml, &f.dialog.Checkcounter,
-                      &f.dialog.Checkdate, &f.dialog.Checkline, &f.dialog.Check_lastadd}) {
-        EXPECT_EQ(box->value(), 0);
+    EXPECT_EQ(shown(f), defaultsFor(folder));
+}
+
+TEST(ExportSettingsLoad, NoSettingsWritesTheDefaultsForHomeOrElseTheWorkingFolder) {
+    for (bool homeUsable : {true, false}) {
+        ExportFixture f;
+        if (!homeUsable) ::setenv("HOME", "/no/such/home", 1);
+        f.openMovies();
+        f.openDialog();
+        EXPECT_EQ(f.dialog.window.caption(), "Export list");
+        EXPECT_EQ(f.dialog.Text2.maxLength(), 2);
+        EXPECT_FALSE(f.main.view.window.isEnabled());
+        expectDefaults(
+            f, homeUsable
+                   ? f.home.path()
+                   : std::filesystem::absolute(f.main.folder.path()).lexically_normal().string());
     }
-    EXPECT_EQ(f.dialog.Text2.text(), "10");
-    EXPECT_EQ(f.dialog.Combo1.text(), "Top");
 }
 
-TEST(ExportSettingsLoad, OpeningWithoutSettingsWritesAndShowsTheDefaults) {
-    ExportFixture f;
-    f.openMovies();
-    f.openDialog();
-    EXPECT_TRUE(f.dialog.window.isLoaded());
-    EXPECT_EQ(f.dialog.window.caption(), "Export list");
-    EXPECT_EQ(f.dialog.Text2.maxLength(), 2);
-    EXPECT_FALSE(f.main.view.window.isEnabled());
-    expectDefaults(f, f.home.path());
-}
-
-TEST(ExportSettingsLoad, BrokenSettingsAreReplacedByTheDefaults) {
-    const std::vector<std::string> broken[] = {
-        {"/", " 1 ", " 1 ", " 0 "},                                              // partial file
-        {"/no/such/folder/anywhere", "1", "1", "1", "1", "1", "1", "5", "Top"},  // vanished
-        {"/", "1", "1", "3", "1", "1", "1", "5", "Top"},     // not a check value
-        {"/", "1", "1", "1", "1", "1", "1", "5", "Middle"},  // not a position
-        {"relative/folder", "1", "1", "1", "1", "1", "1", "5", "Top"},
+TEST(ExportSettingsLoad, SettingsLoadAsTheyAreOrAreReplacedWholeByTheDefaults) {
+    using Lines = std::vector<std::string>;
+    const std::pair<Lines, Lines> cases[] = {
+        // the file, and what the dialog shows
+        {{"/", " 1 ", "1", " 0 ", "0", "2", "", "ab", "Bottom"},
+         {"/", "1", "1", "0", "0", "2", "0", "ab", "Bottom"}},
+        {{"/", " 1 ", " 1 ", " 0 "}, {}},  // partial file
+        {{"/no/such/folder/anywhere", "1", "1", "1", "1", "1", "1", "5", "Top"}, {}},
+        {{"/", "1", "1", "3", "1", "1", "1", "5", "Top"}, {}},     // not a check value
+        {{"/", "1", "1", "1", "1", "1", "1", "5", "Middle"}, {}},  // not a position
+        {{"relative/folder", "1", "1", "1", "1", "1", "1", "5", "Top"}, {}},
     };
-    for (const auto& lines : broken) {
+    for (const auto& [file, expected] : cases) {
         ExportFixture f;
         f.openMovies();
-        f.main.folder.put("export.dat", ExportFixture::settings(lines));
+        f.main.folder.put("export.dat", settings(file));
         f.openDialog();
-        SCOPED_TRACE(lines[0] + " / " + lines.back());
-        expectDefaults(f, f.home.path());
+        SCOPED_TRACE(file[0] + " / " + file.back());
+        if (expected.empty()) {
+            expectDefaults(f, f.home.path());
+        } else {
+            EXPECT_EQ(shown(f), settings(expected));
+            EXPECT_EQ(f.main.folder.get("export.dat"), settings(file));  // nothing replaced
+        }
     }
-}
-
-TEST(ExportSettingsLoad, CheckValuesLoadWithOrWithoutSpaces) {
-    ExportFixture f;
-    f.openMovies();
-    f.main.folder.put("export.dat", ExportFixture::settings({f.out.path(), " 1 ", "1", " 0 ", "0",
-                                                             "2", "", "ab", "Bottom"}));
-    f.openDialog();
-    EXPECT_EQ(f.dialog.Dir1.path(), f.out.path());
-    EXPECT_EQ(f.dialog.Checkart.value(), 1);
-    EXPECT_EQ(f.dialog.Checkhtml.value(), 1);
-    EXPECT_EQ(f.dialog.Checkcounter.value(), 0);
-    EXPECT_EQ(f.dialog.Checkdate.value(), 0);
-    EXPECT_EQ(f.dialog.Checkline.value(), 2);
-    EXPECT_EQ(f.dialog.Check_lastadd.value(), 0);
-    EXPECT_EQ(f.dialog.Text2.text(), "ab");
-    EXPECT_EQ(f.dialog.Combo1.text(), "Bottom");
-    // Loading replaced nothing.
-    EXPECT_EQ(
-        f.main.folder.get("export.dat"),
-        ExportFixture::settings({f.out.path(), " 1 ", "1", " 0 ", "0", "2", "", "ab", "Bottom"}));
-}
-
-TEST(ExportSettingsLoad, UnusableHomeFallsBackToTheWorkingFolderWithoutLooping) {
-    ExportFixture f;
-    ::setenv("HOME", "/no/such/home", 1);
-    f.openMovies();
-    f.openDialog();
-    const std::string working =
-        std::filesystem::absolute(f.main.folder.path()).lexically_normal().string();
-    expectDefaults(f, working);
 }
 
 TEST(ExportSettingsLoad, SettingsThatCannotBeStoredStillOpenWithTheDefaults) {
@@ -92,30 +82,21 @@ TEST(ExportSettingsLoad, SettingsThatCannotBeStoredStillOpenWithTheDefaults) {
     f.openMovies();
     std::filesystem::create_directory(f.main.folder.file("export.dat"));
     f.openDialog();
-    EXPECT_EQ(f.dialog.Dir1.path(), f.home.path());
-    EXPECT_EQ(f.dialog.Text2.text(), "10");
-    EXPECT_EQ(f.dialog.Combo1.text(), "Top");
+    EXPECT_EQ(shown(f), defaultsFor(f.home.path()));
     EXPECT_TRUE(f.main.platform.shown().empty());  // loading never reports
-
-    // Saving does report, and the main window is given back all the same.
-    f.main.platform.answer(Answer::Ok);
-    f.dialog.Command2.click();
-    ASSERT_EQ(f.main.platform.shown().size(), 1u);
-    EXPECT_NE(f.main.platform.shown()[0].prompt.find("export.dat"), std::string::npos);
-    EXPECT_TRUE(f.main.view.window.isEnabled());
 }
 
 TEST(ExportSettingsLoad, TheDriveIsTheVolumeHoldingTheFolder) {
     // The test folders live in the temporary folder, here taken as a volume of its own.
     const std::string volume = std::filesystem::temp_directory_path().string();
     ExportFixture f({"/", "/no-such-volume", volume});
-    std::filesystem::create_directory(f.out.file("sub"));
+    const std::string sub = f.out.file("sub");
+    std::filesystem::create_directory(sub);
     f.openMovies();
-    f.main.folder.put("export.dat", ExportFixture::settings({f.out.file("sub"), "0", "0", "0", "0",
-                                                             "0", "0", "10", "Top"}));
+    f.main.folder.put("export.dat", defaultsFor(sub));
     f.openDialog();
     EXPECT_EQ(f.dialog.Drive1.drive(), volume);
-    EXPECT_EQ(f.dialog.Dir1.path(), f.out.file("sub"));
+    EXPECT_EQ(f.dialog.Dir1.path(), sub);
 
     // Choosing a drive shows its root; one that cannot be read is refused with a beep.
     ASSERT_TRUE(f.dialog.Drive1.setDrive("/"));
@@ -128,41 +109,37 @@ TEST(ExportSettingsLoad, TheDriveIsTheVolumeHoldingTheFolder) {
     EXPECT_EQ(f.dialog.Drive1.drive(), volume);
 }
 
-TEST(ExportSettingsSave, EveryClosingSavesButExitDoesNot) {
+TEST(ExportSettingsSave, EveryClosingSavesAFolderWithACommaButExitDoesNot) {
     ExportFixture f;
+    const std::string folder = f.out.file("a, b");
+    std::filesystem::create_directory(folder);
     f.openMovies();
-
-    // "Cancel".
     f.openDialog();
-    f.dialog.Dir1.setPath(f.out.path());
-    f.dialog.Checkart.userToggle();
+    ASSERT_TRUE(f.dialog.Dir1.setPath(folder));
     f.dialog.Text2.setText("");
     ASSERT_TRUE(f.dialog.Combo1.userPick(1));
-    ASSERT_TRUE(f.dialog.Command2.click());
-    EXPECT_FALSE(f.dialog.window.isLoaded());
-    EXPECT_TRUE(f.main.view.window.isEnabled());
-    EXPECT_GE(f.main.view.window.frontCount(), 1);
-    const std::string saved = ExportFixture::settings(
-        {f.out.path(), " 1 ", " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", "", "Bottom"});
-    EXPECT_EQ(f.main.folder.get("export.dat"), saved);
 
-    // The close box: reopening shows what was saved, and closing saves the change.
-    f.openDialog();
-    EXPECT_EQ(f.dialog.Checkart.value(), 1);
-    EXPECT_EQ(f.dialog.Text2.text(), "");
-    f.dialog.Checkdate.userToggle();
-    f.dialog.window.userClose();
-    EXPECT_TRUE(f.main.view.window.isEnabled());
-    EXPECT_EQ(f.main.folder.get("export.dat"),
-              ExportFixture::settings(
-                  {f.out.path(), " 1 ", " 0 ", " 0 ", " 1 ", " 0 ", " 0 ", "", "Bottom"}));
-
-    // The main window closing unloads the dialog, which saves.
-    f.openDialog();
-    f.dialog.Checkline.userToggle();
-    f.main.view.window.userClose();
-    EXPECT_FALSE(f.dialog.window.isLoaded());
-    EXPECT_NE(f.main.folder.get("export.dat").find(" 1 \r\n 0 \r\n\r\nBottom"), std::string::npos);
+    // Each closing saves the box ticked before it, on top of what the one before saved; the
+    // folder is quoted, and reopening finds it again.
+    std::vector<std::string> saved = {
+        '"' + folder + '"', " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", "", "Bottom"};
+    const std::tuple<ui::memory::MemoryCheckBox*, std::size_t, std::function<void()>> closings[] = {
+        {&f.dialog.Checkart, 1, [&] { f.dialog.Command2.click(); }},
+        {&f.dialog.Checkdate, 4, [&] { f.dialog.window.userClose(); }},
+        {&f.dialog.Checkline, 5, [&] { f.main.view.window.userClose(); }}};
+    for (const auto& [box, line, close] : closings) {
+        SCOPED_TRACE(line);
+        if (!f.dialog.window.isLoaded()) f.openDialog();
+        EXPECT_EQ(f.dialog.Dir1.path(), folder);
+        box->userToggle();
+        const int fronts = f.main.view.window.frontCount();
+        close();
+        saved[line] = " 1 ";
+        EXPECT_FALSE(f.dialog.window.isLoaded());
+        EXPECT_TRUE(f.main.view.window.isEnabled());
+        EXPECT_GT(f.main.view.window.frontCount(), fronts);
+        EXPECT_EQ(f.main.folder.get("export.dat"), settings(saved));
+    }
 
     // "Exit" ends the program without saving.
     ExportFixture g;
@@ -173,49 +150,6 @@ TEST(ExportSettingsSave, EveryClosingSavesButExitDoesNot) {
     g.main.form->Command_print_Click();
     EXPECT_TRUE(g.main.platform.ended());
     EXPECT_EQ(g.main.folder.get("export.dat"), before);
-}
-
-TEST(ExportSettingsSave, FolderWithACommaSurvivesSavingAndLoading) {
-    ExportFixture f;
-    const std::string folder = f.out.file("a, b");
-    std::filesystem::create_directory(folder);
-    f.openMovies();
-    f.openDialog();
-    ASSERT_TRUE(f.dialog.Dir1.setPath(folder));
-    f.dialog.Command2.click();
-    EXPECT_TRUE(f.main.folder.get("export.dat").starts_with("\"" + folder + "\"\r\n"));
-    f.openDialog();
-    EXPECT_EQ(f.dialog.Dir1.path(), folder);
-
-    // The same folder written unquoted, as an older file would hold it, is cut at the comma.
-    f.dialog.Command2.click();
-    f.main.folder.put("export.dat",
-                      ExportFixture::settings({folder, "1", "1", "1", "1", "1", "1", "10", "Top"}));
-    f.openDialog();
-    expectDefaults(f, f.home.path());
-}
-
-TEST(ExportSettingsSave, LastAddedClearedByTheExportIsSavedCleared) {
-    ExportFixture f;
-    f.openMovies();
-    f.main.folder.put("export.dat", ExportFixture::settings(
-                                        {f.out.path(), "0", "0", "0", "0", "0", "1", "11", "Top"}));
-    f.openDialog();
-    ASSERT_EQ(f.dialog.Check_lastadd.value(), 1);
-    f.main.platform.answer(Answer::Ok);  // too many last added
-    f.main.platform.answer(Answer::Ok);  // done
-    ASSERT_TRUE(f.dialog.Command1.click());
-    ASSERT_EQ(f.main.platform.shown().size(), 2u);
-    EXPECT_EQ(f.main.platform.shown()[0].prompt,
-              "More last add's than titels!\r\nExport the list without lastadd's");
-    EXPECT_EQ(f.main.platform.shown()[0].title, "ERROR!");
-    EXPECT_EQ(f.main.platform.shown()[0].style, 16);
-    EXPECT_EQ(f.dialog.Check_lastadd.value(), 0);
-    EXPECT_EQ(f.out.get("Movies.TXT").find("LAST ADDED"), std::string::npos);
-    f.dialog.window.userClose();
-    EXPECT_EQ(f.main.folder.get("export.dat"),
-              ExportFixture::settings(
-                  {f.out.path(), " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", "11", "Top"}));
 }
 
 }  // namespace
