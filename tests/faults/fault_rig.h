@@ -1,7 +1,5 @@
 #pragma once
 
-#include <sys/types.h>
-
 #include <functional>
 #include <map>
 #include <memory>
@@ -17,7 +15,6 @@
 #include "tests/support/memory_dialogs.h"
 #include "tests/support/memory_form1.h"
 #include "tests/support/temp_folder.h"
-#include "ui/memory/memory_controls.h"
 
 // The program's windows on memory controls over a catalogue folder, with the means to make one
 // system call fail, to kill the process at one step, and to compare whole folders.
@@ -28,33 +25,25 @@ using Files = std::map<std::string, std::string>;
 
 // The folder's files, each name after `prefix`; temporary files and the journal included.
 Files snapshot(const std::string& folder, const std::string& prefix = {});
-// The names that differ between two snapshots, for a failure message.
+// The names that differ between two snapshots (" +name": only in the second), for a message.
 std::string difference(const Files& a, const Files& b);
-// The temporary files and journals among the names.
-std::vector<std::string> leftovers(const Files& files);
+// Whether a temporary file or a journal is among the files.
+bool hasLeftovers(const Files& files);
 
-// Forwards every call to a Sys that can be swapped while the windows keep their one store;
-// remembers which call a watched FaultySys made fail, and can kill the process at a step.
-class RelaySys : public catalogue::Sys {
+// The real calls with one planned fault counted from the moment it is planned: a failing call,
+// or SIGKILL before a step. Remembers the call the fault hit.
+class RigSys : public test_support::FaultySys {
   public:
     struct Hit {
-        test_support::SysCall kind;
         std::string path;
         bool reading;  // an open for reading, a read, or the close of a file opened for reading
     };
-
-    // Sends the calls to `sys` from now on; with `watched`, records the call its fault hits.
-    void use(catalogue::Sys& sys, const test_support::FaultySys* watched = nullptr);
-    // Back to the real calls; the recorded hit stays.
-    void reset() {
-        target_ = &catalogue::realSys();
-        watched_ = nullptr;
+    // The n-th call of `kind` from now on fails with `errnum`.
+    void failNext(test_support::SysCall kind, int n, int errnum) {
+        failAt(kind, calls(kind) + n, errnum);
     }
-    // The n-th call from now on (of any kind) kills the process with SIGKILL before it is made.
-    void killAt(int step) {
-        killAt_ = step;
-        steps_ = 0;
-    }
+    // The n-th call of any kind from now on kills the process before it is made.
+    void killAt(int n) { killStep_ = steps() + n; }
     const std::optional<Hit>& hit() const { return hit_; }
 
     int open(const std::string& path, int flags, mode_t mode) override;
@@ -67,44 +56,48 @@ class RelaySys : public catalogue::Sys {
 
   private:
     template <class Call>
-    auto pass(test_support::SysCall kind, const std::string& path, bool reading, Call call);
-    std::pair<std::string, bool> fileOf(int fd) const;
+    auto pass(const Hit& file, Call call);
 
-    catalogue::Sys* target_ = &catalogue::realSys();
-    const test_support::FaultySys* watched_ = nullptr;
     std::optional<Hit> hit_;
-    std::map<int, std::pair<std::string, bool>> fds_;  // path, opened for reading
-    int killAt_ = 0;
-    int steps_ = 0;
+    std::map<int, Hit> files_;  // open descriptors
+    int killStep_ = 0;
 };
 
 // Runs `body` in a forked child that ends with _exit(0) when it returns and _exit(100) when it
-// throws; returns the child's wait status. With `killAfterMs`, the child is killed with SIGKILL
-// that long after it started. Output is flushed first so the child repeats none.
+// throws; returns the wait status. With `killAfterMs`, the child is killed that long after.
 int inChild(const std::function<void()>& body, int killAfterMs = -1);
-// The wait status as words: "killed by signal 9", "exit 0".
-std::string describeStatus(int status);
+// Whether the wait status is that of a process killed with SIGKILL.
+bool killed(int status);
 
-// The dialogs' controls.
-using NewListView = test_support::MemoryNewList;
-using ExportView = test_support::MemoryFormExport;
+// Entries as the entry file holds them: four tagged lines each, from title/type/discs/info rows.
+std::string entryText(const std::vector<std::vector<std::string>>& rows);
+// Lines, each followed by CR LF.
+std::string crlf(const std::vector<std::string>& lines);
+// "Abba Gold", the one entry of the list "Rock" that most tests start from.
+inline const std::string kAbbaDat = entryText({{"Abba Gold", "Music CD", "1", "Original"}});
 
 // A catalogue folder and an output folder, and the windows on them, every call going through
 // `sys`.
 class Rig {
   public:
-    // A fresh folder holding the suggestion files and an empty index, and an output folder.
-    Rig();
-    // The windows over an existing catalogue folder, without an output folder: a child that
-    // is killed leaves nothing of its own behind.
-    explicit Rig(const std::string& folder);
+    // A fresh folder holding the suggestion files and an empty index, and an output folder;
+    // or, given a folder, the windows over it alone (a killed child leaves nothing behind).
+    explicit Rig(const std::string& existing = {});
 
     void put(const std::string& name, const std::string& bytes) const;
+    // A list's entry, article and counter files and its flag " 1 ".
     void putList(const std::string& name, const std::string& entries, const std::string& articles,
-                 const std::string& counter = "A#001\r\n",
-                 const std::string& flag = " 1 \r\n") const;
-    // Export settings for the output folder: every box clear, HTML when asked.
-    void putExportSettings(bool html = false) const;
+                 const std::string& counter) const {
+        put(name + ".dat", entries);
+        put(name + ".art", articles);
+        put(name + ".arn", counter);
+        put(name + ".inf", " 1 \r\n");
+    }
+    // The list "Rock" holding "Abba Gold", and the index `index`.
+    void putRock(const std::string& index = "Rock\r\n") const {
+        putList("Rock", kAbbaDat, crlf({"Abba Gold#*\\A001"}), crlf({"A#002"}));
+        put("pemla.dat", index);
+    }
     // The main window's start-up.
     void start() { view.window.show(); }
     // The user selects a list, or an entry of the open list; false when it is not shown.
@@ -113,11 +106,26 @@ class Rig {
     // The user clears the entry fields and types these values.
     void fill(const std::string& title, const std::string& type, const std::string& discs,
               const std::string& information);
+    // The user adds "Dylan" with this information to the open list, or deletes the open list
+    // confirming twice; an error box, should one come, is answered.
+    void addDylan(const std::string& information = "x") {
+        platform.answer(ui::Answer::Ok);
+        fill("Dylan", "Game", "1", information);
+        view.Command_add.click();
+    }
+    void deleteList() {
+        for (ui::Answer a : {ui::Answer::Yes, ui::Answer::Yes, ui::Answer::Ok}) platform.answer(a);
+        view.Command_delete.click();
+    }
     // The user opens the new-list dialog, types the name and presses "Create".
-    void createList(const std::string& name);
+    void createList(const std::string& name) {
+        view.Command_create.click();
+        newListView.Text1.type(name);
+        newListView.Command1.click();
+    }
 
-    // The catalogue folder's files, and the output folder's under "out/"; the output folder's
-    // path in them reads "<out>" (every rig has its own).
+    // The catalogue folder's files, and the output folder's under "out/", whose path in them
+    // reads "<out>" (every rig has its own).
     Files files() const;
     // The message boxes titled "Error" shown so far.
     std::vector<ui::memory::MemoryPlatform::Shown> errors() const;
@@ -126,22 +134,16 @@ class Rig {
     std::unique_ptr<test_support::TempFolder> own_, ownOut_;
 
   public:
-    std::string folder;
-    std::string out;
-    RelaySys sys;
+    std::string folder, out;
+    RigSys sys;
     catalogue::Store store;
     ui::memory::MemoryPlatform platform;
     test_support::MemoryForm1 view;
     main_window::Form1 form;
-    NewListView newListView;
+    test_support::MemoryNewList newListView;
     new_list::Form_new_list newList;
-    ExportView exportView;
+    test_support::MemoryFormExport exportView;
     exporting::Form_Export exporter;
 };
-
-// Entries as the entry file holds them: four tagged lines each, from title/type/discs/info rows.
-std::string entryText(const std::vector<std::vector<std::string>>& rows);
-// Lines, each followed by CR LF.
-std::string crlf(const std::vector<std::string>& lines);
 
 }  // namespace faults
