@@ -140,27 +140,6 @@ TEST(MainWindowOnQt, TheLargestListOpensQuickly) {
     EXPECT_LT(selectMs, 1000);
 }
 
-TEST(MainWindowOnQt, ComboBoxesStopTypingAtTheirLimits) {
-    test_support::TempFolder folder;
-    folder.put("type.dat", "Types\r\n");
-    folder.put("information.dat", "Information\r\n");
-    folder.put("pemla.dat", "");
-    QtMainWindow w(folder);
-    w.view.controls().window.show();
-    struct Case {
-        QComboBox* box;
-        int limit;
-    };
-    for (const Case& c :
-         {Case{w.view.Combo1, 17}, Case{w.view.Combo2, 6}, Case{w.view.Combo3, 16}}) {
-        c.box->lineEdit()->clear();
-        w.typeInto(c.box, QString(30, QChar('x')));
-        EXPECT_EQ(c.box->currentText().size(), c.limit);
-        QTest::keyClick(c.box, Qt::Key_Backspace);
-        EXPECT_EQ(c.box->currentText().size(), c.limit - 1);
-    }
-}
-
 TEST(MainWindowOnQt, AMissingFileStopsTheStartWithAMessage) {
     test_support::TempFolder folder;
     folder.put("type.dat", "Types\r\n");

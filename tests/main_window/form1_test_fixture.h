@@ -1,7 +1,6 @@
 #pragma once
 
 #include <gtest/gtest.h>
-#include <sys/stat.h>
 
 #include <filesystem>
 #include <map>
@@ -15,6 +14,7 @@
 namespace main_window_test {
 
 using Strings = std::vector<std::string>;
+using Files = std::map<std::string, std::string>;
 using ui::Answer;
 
 // Lines, each followed by CR LF: what every file the program writes looks like.
@@ -31,10 +31,8 @@ struct Item {
 // Entries as the entry file holds them, four tagged lines each.
 inline std::string entries(const std::vector<Item>& items) {
     std::string text;
-    for (const Item& e : items) {
-        text += "<|?" + e.title + "\r\n<|'" + e.type + "\r\n<||" + e.discs + "\r\n<|*" + e.info +
-                "\r\n";
-    }
+    for (const Item& e : items)
+        text += crlf({"<|?" + e.title, "<|'" + e.type, "<||" + e.discs, "<|*" + e.info});
     return text;
 }
 
@@ -53,20 +51,8 @@ inline const std::string kSkeletonDat =
 inline const std::string kSkeletonArt = "Add an item and delete me!#*\\A001\r\n";
 inline const std::string kPlaceholderList = "Add one & delete me!";
 
-// Every line ends with exactly one CR LF, no line is empty, and no CR or LF stands alone.
-inline void expectTidy(const std::string& name, const std::string& bytes) {
-    for (std::size_t at = 0, end; at < bytes.size(); at = end + 2) {
-        end = bytes.find("\r\n", at);
-        ASSERT_TRUE(end != std::string::npos && end > at) << name << ": line at " << at;
-        ASSERT_EQ(bytes.substr(at, end - at).find_first_of("\r\n"), std::string::npos)
-            << name << ": line at " << at;
-    }
-}
-
 class Form1Test : public ::testing::Test, public test_support::MainWindowFixture {
   protected:
-    using Files = std::map<std::string, std::string>;
-
     // "Rock" in the order its entries were added; List1 shows 1st, abc, abcd, xabc, Zebra.
     // "abcd" stands before "abc" and "xabc" ends with "abc", in both files.
     const std::vector<Item> rock = {{"Zebra", "CD", "1", "Original"},
@@ -82,10 +68,8 @@ class Form1Test : public ::testing::Test, public test_support::MainWindowFixture
     void putRock(const Strings& others = {}) {
         putList("Rock", entries(rock), articles(rockArt), rockArn);
         Strings index = {"Rock"};
-        for (const std::string& other : others) {
-            putList(other, kSkeletonDat, kSkeletonArt);
-            index.push_back(other);
-        }
+        for (const std::string& other : others) putList(other, kSkeletonDat, kSkeletonArt);
+        index.insert(index.end(), others.begin(), others.end());
         folder.put("pemla.dat", crlf(index));
     }
     void startWithRock() {
@@ -110,23 +94,17 @@ class Form1Test : public ::testing::Test, public test_support::MainWindowFixture
         }
         return files;
     }
-    // The file's identity: a file replaced by a new one gets another inode.
-    ino_t inode(const std::string& name) const {
-        struct stat st {};
-        EXPECT_EQ(::stat(folder.file(name).c_str(), &st), 0) << name;
-        return st.st_ino;
-    }
-    void expectFile(const std::string& name, const std::string& expected) const {
-        const std::string got = folder.get(name);
-        EXPECT_EQ(got, expected) << name;
-        expectTidy(name, got);
+    // A list's entry, article and counter files, byte for byte.
+    void expectList(const std::string& list, const std::string& dat, const std::string& art,
+                    const std::string& arn) const {
+        EXPECT_EQ(folder.get(list + ".dat"), dat) << list;
+        EXPECT_EQ(folder.get(list + ".art"), art) << list;
+        EXPECT_EQ(folder.get(list + ".arn"), arn) << list;
     }
 
     // The user clears a field and types into it.
-    static void retype(ui::memory::MemoryTextBox& box, const std::string& text) {
-        box.type(std::string(box.text().size(), '\b') + text);
-    }
-    static void retype(ui::memory::MemoryComboBox& box, const std::string& text) {
+    template <typename Box>
+    static void retype(Box& box, const std::string& text) {
         box.type(std::string(box.text().size(), '\b') + text);
     }
     void fill(const Item& e) {
@@ -148,7 +126,8 @@ class Form1Test : public ::testing::Test, public test_support::MainWindowFixture
         EXPECT_EQ(fields(), "|Select type|Disc(s)|Info|");
         EXPECT_EQ(view.List1.selectedIndex(), -1);
     }
-    // Exactly one message box was shown since `before` boxes, with this style and title.
+    // Exactly one message box was shown since `before` boxes, with this style, title and prompt
+    // (any prompt when none is given).
     void expectBox(std::size_t before, int style, const std::string& title,
                    const std::string& prompt = {}) const {
         const auto& shown = platform.shown();
