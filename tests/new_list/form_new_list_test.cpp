@@ -185,8 +185,9 @@ TEST(NewListDialog, AcceptsNamesThatOnlyBeginLikeAListOrHoldAReservedWord) {
         EXPECT_TRUE(d.f.folder.has(name + ".dat")) << name;
     }
     EXPECT_TRUE(d.f.platform.shown().empty());
-    EXPECT_EQ(d.f.folder.get("pemla.dat"),
-              "Hard Rock\r\n\r\nOld\r\nHard\r\nexports\r\nmyexport\r\nxpor\r\nType A\r\na.b\r\n...\r\n");
+    EXPECT_EQ(
+        d.f.folder.get("pemla.dat"),
+        "Hard Rock\r\n\r\nOld\r\nHard\r\nexports\r\nmyexport\r\nxpor\r\nType A\r\na.b\r\n...\r\n");
 }
 
 TEST(NewListDialog, ProbeLeavesAFileTheUserAlreadyHad) {
