@@ -4,11 +4,8 @@
 #include <vector>
 
 #include "catalogue/catalogue_error.h"
-#include "catalogue/file_text.h"
-#include "catalogue/records.h"
-#include "export/html_page.h"
 #include "export/last_added.h"
-#include "export/report_table.h"
+#include "export/list_report.h"
 
 namespace exporting {
 
@@ -155,52 +152,29 @@ void Form_Export::SaveSettings() {
 }
 
 std::string Form_Export::BuildReport(const std::string& list) {
-    const std::optional<long> flag = store_.readNumber(catalogue::flagFile(list));
-    if (flag == 1) c_.Check_noinfo.setValue(0);
-    if (flag == 0) c_.Check_noinfo.setValue(1);
-
-    const std::string entries = store_.readText(catalogue::entryFile(list));
-    const bool articleNumbers = c_.Checkart.value() == 1;
-    const std::string articles =
-        articleNumbers ? store_.readText(catalogue::articleFile(list)) : std::string();
-
     const ui::ListBox& titlesBox = form1_.controls().List1;
     std::vector<std::string> titles;
     titles.reserve(static_cast<std::size_t>(titlesBox.count()));
     for (int i = 0; i < titlesBox.count(); ++i) titles.push_back(titlesBox.itemText(i));
 
-    ReportOptions options;
-    options.articleNumbers = articleNumbers;
-    options.information = c_.Check_noinfo.value() != 1;
-    options.date = c_.Checkdate.value() == 1;
-    options.separatorLines = c_.Checkline.value() == 1;
-    options.counter = c_.Checkcounter.value() == 1;
-    const std::string date = options.date ? platform_.shortDate() : std::string();
-    std::string report = BuildReportTable(list, entries, articles, titles, options, date);
-
-    // The top text is optional: a file that is missing or cannot be read is simply left out.
-    try {
-        if (auto top = store_.readTextIfExists(list + ".top")) report.insert(0, *top);
-    } catch (const CatalogueError&) {
-    }
-
-    const std::string amount = c_.Text2.text();
-    const std::string position = c_.Combo1.text();
-    LastAddedRequest request;
-    request.include = c_.Check_lastadd.value() == 1;
-    request.amountText = amount;
-    request.position = position;
-    request.information = options.information;
-    request.titleCount = titles.size();
-    LastAddedResult withSection = BuildLastAdded(entries, std::move(report), request);
-    if (withSection.refused) {
+    ReportChoices choices;
+    choices.articleNumbers = c_.Checkart.value() == 1;
+    choices.counter = c_.Checkcounter.value() == 1;
+    choices.date = c_.Checkdate.value() == 1;
+    choices.separatorLines = c_.Checkline.value() == 1;
+    choices.noInformation = c_.Check_noinfo.value() == 1;
+    choices.lastAdded = c_.Check_lastadd.value() == 1;
+    choices.amountText = c_.Text2.text();
+    choices.position = c_.Combo1.text();
+    const std::string date = choices.date ? platform_.shortDate() : std::string();
+    ListReport report = buildListReport(store_, list, titles, choices, date);
+    if (report.flag == 1) c_.Check_noinfo.setValue(0);
+    if (report.flag == 0) c_.Check_noinfo.setValue(1);
+    if (report.lastAddedRefused) {
         c_.Check_lastadd.setValue(0);
         platform_.messageBox(kTooManyLastAdded, 16, kTooManyLastAddedTitle);
     }
-    report = std::move(withSection.report);
-
-    report.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
-    return report;
+    return std::move(report.text);
 }
 
 void Form_Export::RunExport() {
@@ -217,12 +191,9 @@ void Form_Export::RunExport() {
             if (!folder.ends_with('/')) folder.push_back('/');
             c_.Text1.setText(folder);
             const std::string out = c_.Text1.text();
-            if (c_.Checkhtml.value() == 1) {
-                catalogue::writeFileAtomically(out + list + ".html", HtmlPage(list, report),
-                                               store_.sys());
-            } else {
-                catalogue::writeFileAtomically(out + list + ".TXT", report + "\r\n", store_.sys());
-            }
+            const bool html = c_.Checkhtml.value() == 1;
+            catalogue::writeFileAtomically(out + list + (html ? ".html" : ".TXT"),
+                                           reportFileBytes(list, report, html), store_.sys());
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);
             form1_.showError(error.file(), error.reason());
