@@ -7,8 +7,12 @@ namespace {
 
 TEST_F(Form1Test, FindSelectsMatchingTitlesInTurnAndNeverHidesOne) {
     // List1 order: Abba Gold, abba live, Blur, Crème Brûlée, CRÈME fraîche, Zappa.
-    const std::string creme = "Cr\xE8me Br\xFBl\xE9" "e";
-    const std::string fraiche = "CR\xC8ME fra\xEE" "che";
+    const std::string creme =
+        "Cr\xE8me Br\xFBl\xE9"
+        "e";
+    const std::string fraiche =
+        "CR\xC8ME fra\xEE"
+        "che";
     putList("Mix",
             entries({{"Zappa", "CD", "1", "z"},
                      {"abba live", "LP", "2", "l"},
@@ -34,8 +38,8 @@ TEST_F(Form1Test, FindSelectsMatchingTitlesInTurnAndNeverHidesOne) {
     } steps[] = {
         {"ABBA", 0, "Abba Gold|CD|6|g|A002"},
         {"", next, "abba live|LP|2|l|A001"},
-        {"", next, "Abba Gold|CD|6|g|A002"},  // wraps to the top
-        {"", previous, "abba live|LP|2|l|A001"},  // and to the bottom
+        {"", next, "Abba Gold|CD|6|g|A002"},       // wraps to the top
+        {"", previous, "abba live|LP|2|l|A001"},   // and to the bottom
         {"cr\xC8me", 0, creme + "|DVD|3|c|!001"},  // accented capitals fold as the list sorts
         {"", next, fraiche + "|CD|5|f|!002"},
         {"creme", 0, ""},  // an unaccented letter is another letter

@@ -1,0 +1,170 @@
+#include "app/command_tasks.h"
+
+#include <cerrno>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <ostream>
+#include <sstream>
+
+#include "catalogue/catalogue_error.h"
+#include "catalogue/csv.h"
+#include "catalogue/file_text.h"
+#include "catalogue/latin1.h"
+#include "catalogue/list_import.h"
+#include "catalogue/store.h"
+#include "export/export_settings.h"
+#include "export/list_report.h"
+#include "ui/qt/qt_platform.h"
+
+namespace app {
+
+namespace {
+
+using catalogue::latin1ToUtf8;
+
+// What a command could not do, for one line on standard error: list names and values converted
+// to UTF-8, paths as the bytes they are.
+struct Failure {
+    std::string message;
+};
+
+// The list name typed on the command line, as the catalogue's ISO-8859-1 bytes.
+std::string listName(const std::string& typed) {
+    if (!catalogue::isUtf8(typed)) {
+        throw Failure{"The list name \"" + typed + "\" is not UTF-8 text."};
+    }
+    char32_t outside = 0;
+    std::optional<std::string> name = catalogue::utf8ToLatin1(typed, &outside);
+    if (!name) {
+        char code[16];
+        std::snprintf(code, sizeof code, "U+%04X", static_cast<unsigned>(outside));
+        throw Failure{"The list name holds the character " + std::string(code) +
+                      ", which no list name can hold (list names are Latin-1)."};
+    }
+    return *name;
+}
+
+// The index's spelling of a listed name (ignoring case).
+std::string listedName(catalogue::Store& store, const std::string& name) {
+    for (const std::string& line : store.readLines("pemla.dat")) {
+        if (catalogue::equalsIgnoreCase(line, name)) return line;
+    }
+    throw Failure{"There is no list \"" + latin1ToUtf8(name) + "\" in the data folder \"" +
+                  store.folder() + "\"."};
+}
+
+// A catalogue file's failure; the file's name is a list's ISO-8859-1 name.
+std::string fileError(const catalogue::CatalogueError& e) {
+    return "The file \"" + latin1ToUtf8(e.file()) + "\" could not be used: " + e.reason() + ".";
+}
+
+// The report's choices: the export dialog's saved ones, or its defaults when none are saved.
+exporting::ReportChoices savedChoices(catalogue::Store& store) {
+    exporting::ExportSettings settings;
+    try {
+        if (store.exists(exporting::kSettingsFile)) {
+            if (auto saved = exporting::decodeSettings(store.readBytes(exporting::kSettingsFile))) {
+                settings = *saved;
+            }
+        }
+    } catch (const catalogue::CatalogueError&) {
+        // Unreadable settings: the dialog falls back to its defaults too.
+    }
+    exporting::ReportChoices choices;
+    choices.counter = settings.checks[2] == 1;
+    choices.date = settings.checks[3] == 1;
+    choices.separatorLines = settings.checks[4] == 1;
+    choices.lastAdded = settings.checks[5] == 1;
+    choices.amountText = settings.amount;
+    choices.position = settings.position;
+    return choices;
+}
+
+std::string exportBytes(const CommandLine& line, catalogue::Store& store, const std::string& list,
+                        std::ostream& err) {
+    if (line.csv) return exporting::listCsv(store, list);
+    exporting::ReportChoices choices = savedChoices(store);
+    choices.articleNumbers = line.articleNumbers;
+    const std::string date = choices.date ? ui::qt::QtPlatform().shortDate() : std::string();
+    const exporting::ListReport report =
+        exporting::buildListReport(store, list, exporting::listTitles(store, list), choices, date);
+    if (report.lastAddedRefused) {
+        err << "pemla: the export settings ask for more last added titles than the list holds; "
+               "the report leaves that section out.\n";
+    }
+    return exporting::reportFileBytes(list, report.text, line.html);
+}
+
+std::string readWholeFile(const std::string& path) {
+    std::ifstream in(path, std::ios::binary);
+    std::ostringstream bytes;
+    if (in) bytes << in.rdbuf();
+    if (!in || in.bad()) {
+        throw Failure{"The file \"" + path + "\" could not be read: " + std::strerror(errno) + "."};
+    }
+    return bytes.str();
+}
+
+}  // namespace
+
+void resolveCommandFiles(CommandLine& line) {
+    std::error_code ec;
+    if (!line.file.empty()) line.file = std::filesystem::absolute(line.file, ec).string();
+    if (line.outputFile)
+        *line.outputFile = std::filesystem::absolute(*line.outputFile, ec).string();
+}
+
+int exportCommand(const CommandLine& line, const std::string& folder, std::ostream& out,
+                  std::ostream& err) {
+    try {
+        catalogue::Store store(folder);
+        store.recover();
+        const std::string list = listedName(store, listName(line.list));
+        const std::string bytes = exportBytes(line, store, list, err);
+        if (line.outputFile) {
+            try {
+                catalogue::writeFileAtomically(*line.outputFile, bytes, store.sys());
+            } catch (const catalogue::CatalogueError& e) {
+                throw Failure{"The file \"" + *line.outputFile +
+                              "\" could not be written: " + e.reason() + "."};
+            }
+        } else if (!out.write(bytes.data(), static_cast<std::streamsize>(bytes.size())).flush()) {
+            throw Failure{"Standard output could not be written."};
+        }
+        return 0;
+    } catch (const Failure& f) {
+        err << "pemla: " << f.message << '\n';
+    } catch (const catalogue::CatalogueError& e) {
+        err << "pemla: " << fileError(e) << '\n';
+    }
+    return 1;
+}
+
+int importCommand(const CommandLine& line, const std::string& folder, std::ostream& out,
+                  std::ostream& err) {
+    try {
+        const std::string name = listName(line.list);
+        const std::string csv = readWholeFile(line.file);
+        catalogue::Store store(folder);
+        store.recover();
+        const catalogue::ImportResult result = catalogue::importCsv(store, name, csv);
+        if (!result.problem.empty()) throw Failure{latin1ToUtf8(result.problem)};
+        for (const auto& refused : result.refused) {
+            err << "pemla: " << line.file << " line " << refused.line << ": "
+                << latin1ToUtf8(refused.reason) << '\n';
+        }
+        out << result.added << (result.added == 1 ? " row" : " rows") << " added to the list \""
+            << latin1ToUtf8(result.list) << "\"" << (result.created ? " (a new list)" : "") << ", "
+            << result.refused.size() << " refused.\n";
+        if (result.refused.empty()) return 0;
+        return result.added > 0 ? 3 : 1;
+    } catch (const Failure& f) {
+        err << "pemla: " << f.message << '\n';
+    } catch (const catalogue::CatalogueError& e) {
+        err << "pemla: " << fileError(e) << " Nothing was imported.\n";
+    }
+    return 1;
+}
+
+}  // namespace app
