@@ -7,6 +7,7 @@
 #include <cerrno>
 #include <iostream>
 
+#include "catalogue/list_import.h"
 #include "tests/faults/fault_rig.h"
 
 namespace faults {
@@ -45,6 +46,14 @@ void saveExportSettings(Rig& r) {
 void writeReport(Rig& r) {
     r.exportView.Command1.click();
 }
+// An import as the command runs it, its failures shown as the command prints them.
+void importRows(Rig& r, const char* list) {
+    r.form.guarded([&] {
+        const std::string rows = "title,type\r\nDylan,LP\r\nBlur,dup\r\n\"Zappa, Frank\",CD\r\n";
+        const catalogue::ImportResult result = catalogue::importCsv(r.store, list, rows);
+        if (!result.problem.empty()) r.platform.messageBox(result.problem, 16, "Error");
+    });
+}
 
 const Answer kYes = Answer::Yes;
 // clang-format off
@@ -62,6 +71,8 @@ const Operation kOperations[] = {
     {"SaveExportSettings", "Rock", nullptr, 0, {}, saveExportSettings},
     {"WriteReportAsText", "Rock", nullptr, 0, {Answer::Ok}, writeReport},
     {"WriteReportAsHtml", "Rock", nullptr, 1, {Answer::Ok}, writeReport},
+    {"ImportIntoAList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Rock"); }},
+    {"ImportIntoANewList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Blues"); }},
 };
 // clang-format on
 
