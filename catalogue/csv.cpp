@@ -57,7 +57,11 @@ std::optional<char32_t> decodeOne(std::string_view bytes, std::size_t& at) {
 
 bool isUtf8(std::string_view bytes) {
     for (std::size_t at = 0; at < bytes.size();) {
-        if (!decodeOne(bytes, at)) return false;
+        if (static_cast<unsigned char>(bytes[at]) < 0x80) {
+            ++at;  // most of a file is ASCII
+        } else if (!decodeOne(bytes, at)) {
+            return false;
+        }
     }
     return true;
 }
@@ -66,6 +70,10 @@ std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside
     std::string latin1;
     latin1.reserve(utf8.size());
     for (std::size_t at = 0; at < utf8.size();) {
+        if (static_cast<unsigned char>(utf8[at]) < 0x80) {
+            latin1.push_back(utf8[at++]);
+            continue;
+        }
         const std::optional<char32_t> code = decodeOne(utf8, at);
         if (!code || *code > 0xFF) {
             if (outside != nullptr) *outside = code.value_or(0xFFFD);

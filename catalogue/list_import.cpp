@@ -121,6 +121,8 @@ ImportResult importCsv(Store& store, const std::string& list, std::string_view c
         result.created = true;
     }
 
+    g.titles.reserve(g.count + records.size());
+    g.entries.reserve(g.entries.size() + csvBytes.size() + records.size() * 12);
     for (std::size_t r = 1; r < records.size(); ++r) {
         const CsvRecord& record = records[r];
         std::array<std::string, 4> values;
