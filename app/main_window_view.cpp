@@ -6,6 +6,7 @@
 #include <QListWidget>
 #include <QPainter>
 #include <QPushButton>
+#include <QShortcut>
 
 namespace app {
 
@@ -123,13 +124,19 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     Command_add = new QPushButton(w);
     Command_change = new QPushButton(w);
     Command_clear = new QPushButton(w);
+    Label_find = caption(w);
+    Label_find->setText(QStringLiteral("Find title:"));
+    Text_find = new QLineEdit(w);
+    Text_find->setValidator(new ui::qt::Latin1Validator(Text_find));
+    Text_find->setClearButtonEnabled(true);
     a_ = std::make_unique<Adapters>(*this);
     layOut();
 
     QWidget* order[] = {
         Text1,          Combo1,         Combo2,         Combo3,           Command_add,
         Command_change, Command_clear,  Command_search, Command_delentry, Command_export,
-        Command_print,  Command_create, Command_delete, List_list,        List1};
+        Command_print,  Command_create, Command_delete, List_list,        Text_find,
+        List1};
     for (std::size_t i = 1; i < std::size(order); ++i) QWidget::setTabOrder(order[i - 1], order[i]);
 }
 
@@ -152,7 +159,9 @@ void MainWindowView::layOut() {
     Command_print->setGeometry(mid, 214, 118, 28);
 
     Label2->setGeometry(372, 10, 316, 18);
-    List1->setGeometry(372, 30, 316, 246);
+    Label_find->setGeometry(372, 30, 70, 24);
+    Text_find->setGeometry(444, 30, 244, 24);
+    List1->setGeometry(372, 58, 316, 218);
 
     // The column header is one text; each field starts under its word.
     const QString header =
@@ -178,6 +187,17 @@ void MainWindowView::layOut() {
     Command_add->setGeometry(width - left - 3 * 96 - 12, rowY, 96, 28);
     Command_change->setGeometry(width - left - 2 * 96 - 6, rowY, 96, 28);
     Command_clear->setGeometry(width - left - 96, rowY, 96, 28);
+}
+
+void MainWindowView::connectFinder(main_window::TitleFinder& finder) {
+    QObject::connect(Text_find, &QLineEdit::textEdited, [&finder](const QString& text) {
+        finder.Text_find_Change(ui::qt::fromQt(text));
+    });
+    QObject::connect(Text_find, &QLineEdit::returnPressed, [&finder] { finder.FindNext(); });
+    auto* next = new QShortcut(QKeySequence(Qt::Key_F3), window_.get());
+    QObject::connect(next, &QShortcut::activated, [&finder] { finder.FindNext(); });
+    auto* previous = new QShortcut(QKeySequence(Qt::SHIFT | Qt::Key_F3), window_.get());
+    QObject::connect(previous, &QShortcut::activated, [&finder] { finder.FindPrevious(); });
 }
 
 main_window::Form1Controls MainWindowView::controls() {
