@@ -1,11 +1,12 @@
 #include "app/command_tasks.h"
 
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
-#include <fstream>
 #include <ostream>
-#include <sstream>
 
 #include "catalogue/catalogue_error.h"
 #include "catalogue/csv.h"
@@ -97,13 +98,35 @@ std::string exportBytes(const CommandLine& line, catalogue::Store& store, const 
 }
 
 std::string readWholeFile(const std::string& path) {
-    std::ifstream in(path, std::ios::binary);
-    std::ostringstream bytes;
-    if (in) bytes << in.rdbuf();
-    if (!in || in.bad()) {
-        throw Failure{"The file \"" + path + "\" could not be read: " + std::strerror(errno) + "."};
+    std::string bytes;
+    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd >= 0) {
+        char buffer[65536];
+        ssize_t got = 0;
+        while ((got = ::read(fd, buffer, sizeof buffer)) > 0) {
+            bytes.append(buffer, static_cast<std::size_t>(got));
+        }
+        const int error = errno;
+        ::close(fd);
+        if (got == 0) return bytes;
+        errno = error;
     }
-    return bytes.str();
+    throw Failure{"The file \"" + path + "\" could not be read: " + std::strerror(errno) + "."};
+}
+
+// A report written over one of the catalogue's own files would destroy it.
+void refuseCatalogueFile(const std::string& output, const std::string& folder) {
+    namespace fs = std::filesystem;
+    std::error_code ec;
+    const fs::path target = fs::weakly_canonical(output, ec);
+    if (ec || target.parent_path() != fs::weakly_canonical(folder, ec) || ec) return;
+    const std::string extension = target.extension().string();
+    for (const char* kept : {".dat", ".art", ".arn", ".inf", ".journal"}) {
+        if (extension == kept) {
+            throw Failure{"The file \"" + output +
+                          "\" is one of the catalogue's own files; choose another name."};
+        }
+    }
 }
 
 }  // namespace
@@ -123,6 +146,7 @@ int exportCommand(const CommandLine& line, const std::string& folder, std::ostre
         const std::string list = listedName(store, listName(line.list));
         const std::string bytes = exportBytes(line, store, list, err);
         if (line.outputFile) {
+            refuseCatalogueFile(*line.outputFile, folder);
             try {
                 catalogue::writeFileAtomically(*line.outputFile, bytes, store.sys());
             } catch (const catalogue::CatalogueError& e) {

@@ -218,7 +218,7 @@ TEST_F(Commands, CsvRoundTrip) {
               articles({{"Abba Gold", "A001"}, {"Zoo, \"live\"", "Z001"}, {"\xE9t\xE9", "!001"}}));
 }
 
-TEST_F(Commands, ExportRefusalsNameWhatFailed) {
+TEST_F(Commands, RefusalsNameWhatFailed) {
     const struct {
         std::vector<std::string> args;
         std::string err;
@@ -240,6 +240,7 @@ TEST_F(Commands, ExportRefusalsNameWhatFailed) {
         EXPECT_EQ(r.err, "pemla: " + c.err + "\n");
         EXPECT_EQ(r.out, "");
     }
+    EXPECT_EQ(folder.get("Rock.dat"), kRockDat);
 }
 
 // The command writes what the dialog writes with the same options: --html and --article-numbers
