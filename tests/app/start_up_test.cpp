@@ -26,7 +26,7 @@ app::CommandLine parse(std::vector<const char*> arguments) {
     return app::parseCommandLine(static_cast<int>(arguments.size()), arguments.data());
 }
 
-TEST(StartUp, CommandLine) {
+TEST(StartUpOptions, CommandLine) {
     struct Case {
         std::vector<const char*> arguments;
         Action action;
@@ -57,7 +57,7 @@ TEST(StartUp, CommandLine) {
     EXPECT_EQ(parse({"a\xe9"}).positional, std::vector<std::string>{"a\xe9"});
 }
 
-TEST(StartUp, ChoosingTheDataFolder) {
+TEST(StartUpOptions, ChoosingTheDataFolder) {
     using Env = std::map<std::string, std::string>;
     struct Case {
         std::optional<std::string> option;
@@ -88,7 +88,7 @@ TEST(StartUp, ChoosingTheDataFolder) {
     }
 }
 
-TEST(StartUp, PreparingTheDataFolder) {
+TEST(StartUpOptions, PreparingTheDataFolder) {
     test_support::TempFolder supplied;
     supplied.put("type.dat", "Types\r\nDVD\r\n");
     supplied.put("information.dat", "Info\r\nOriginal\r\n");
