@@ -7,6 +7,8 @@
 #include <QAccessible>
 #include <QApplication>
 #include <QComboBox>
+#include <QIcon>
+#include <QImage>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QTest>
@@ -78,6 +80,10 @@ TEST(Windows, TheMainWindowGrowsAndItsListsTakeTheRoom) {
                 << b->metaObject()->className();
         }
     }
+
+    // It carries the program's picture, drawn from the built-in file.
+    const QImage icon = app::programIcon().pixmap(32).toImage();
+    EXPECT_GT(qAlpha(icon.pixel(16, 16)), 0);
 
     // Its size and place are kept for the next start.
     test_support::TempFolder config;
