@@ -2,8 +2,10 @@
 // handlers holds when a user clicks and types.
 #include <gtest/gtest.h>
 
+#include <QApplication>
 #include <QComboBox>
 #include <QElapsedTimer>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -16,6 +18,7 @@
 #include "catalogue/store.h"
 #include "main_window/form1.h"
 #include "tests/support/temp_folder.h"
+#include "ui/qt/qt_controls.h"
 #include "ui/qt/qt_platform.h"
 
 namespace {
@@ -70,12 +73,20 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     EXPECT_EQ(w.view.List1->count(), 1);
     EXPECT_EQ(w.view.Label2->text(), QStringLiteral("... amount:  1 ..."));
 
-    // Add "Abbey Road" of type Music CD, 2 discs.
-    w.typeInto(w.view.Text1, QStringLiteral("Abbey Road"));
+    // Add "Abbey Road" of type Music CD, 2 discs: the euro sign is refused with a beep, and "2"
+    // typed over the selected "Disc(s)" fits the limit of six.
+    int beeps = 0;
+    ui::qt::setRefusalHook([&] { ++beeps; });
+    w.typeInto(w.view.Text1, QStringLiteral("Abbey "));
+    QKeyEvent euro(QEvent::KeyPress, 0, Qt::NoModifier, QString::fromUtf8("\xE2\x82\xAC"));
+    QApplication::sendEvent(w.view.Text1, &euro);
+    w.typeInto(w.view.Text1, QStringLiteral("Road"));
+    EXPECT_EQ(beeps, 1);
     w.view.Combo1->setCurrentIndex(0);
-    w.view.Combo2->lineEdit()->clear();
+    w.view.Combo2->lineEdit()->selectAll();
     w.typeInto(w.view.Combo2, QStringLiteral("2"));
     w.click(w.view.Command_add);
+    ui::qt::setRefusalHook(nullptr);
     EXPECT_EQ(folder.get("Music.dat"),
               "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n"
               "<|?Abbey Road\r\n<|'Music CD\r\n<||2\r\n<|*Info\r\n");
@@ -84,6 +95,9 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     ASSERT_EQ(w.view.List1->count(), 2);
     EXPECT_EQ(w.view.List1->item(0)->text(), QStringLiteral("Abbey Road"));
     EXPECT_TRUE(w.view.Text1->text().isEmpty());
+    // After the reset, Down starts again at the first suggestion.
+    QTest::keyClick(w.view.Combo1, Qt::Key_Down);
+    EXPECT_EQ(w.view.Combo1->currentText(), QStringLiteral("Music CD"));
 
     // Select it, change its discs, confirm.
     answerAll(ui::Answer::Yes);
