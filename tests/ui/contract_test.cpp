@@ -5,9 +5,11 @@
 #include <QApplication>
 #include <QClipboard>
 #include <QComboBox>
+#include <QDate>
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QLocale>
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
@@ -267,6 +269,20 @@ TEST(MemoryMessageBoxes, AnUnscriptedBoxFailsTheTest) {
     EXPECT_EQ(platform.messageBox("sure?", 4, "Change item"), ui::Answer::Yes);
     ASSERT_EQ(platform.shown().size(), 2u);
     EXPECT_EQ(platform.shown()[1].style, 4);
+}
+
+TEST(QtShortDate, IsAsciiDigitsInTheLocalesOrderNeverAMonthNameOrOtherDigits) {
+    const std::pair<const char*, const char*> cases[] = {
+        {"C", "06/12/2026"},     {"en_US", "12/6/26"},    {"de_DE", "06.12.26"},
+        {"ar_EG", "06/12/2026"}, {"fa_IR", "2026/12/06"}, {"bn_BD", "06/12/2026"},
+        {"mr_IN", "06/12/2026"}, {"my_MM", "06-12-2026"}, {"ko_KR", "26. 12. 6."}};
+    for (const auto& [name, shown] : cases) {
+        EXPECT_EQ(qt::numericDate(QLocale(QString::fromLatin1(name)), QDate(2026, 12, 6)), shown)
+            << name;
+    }
+    // The program's own date under the locale this runs in; ctest runs it under C and fa_IR too.
+    const std::string today = qt::QtPlatform().shortDate();
+    EXPECT_EQ(today.find_first_not_of("0123456789/.- "), std::string::npos) << today;
 }
 
 TEST(QtTextEntry, TextTheFilesCannotHoldIsRefusedWholeWithABeep) {
