@@ -68,7 +68,6 @@ TEST(FileNames, EveryLatin1NameHasOneUtf8NameAndOnlyThoseDecode) {
     std::string all;
     for (int c = 1; c < 256; ++c) all.push_back(static_cast<char>(c));
     EXPECT_EQ(latin1Name(fileSystemName(all)), all);
-    EXPECT_EQ(fileSystemName("B\xFChne \xD8"), "B\xC3\xBChne \xC3\x98");
     // Overlong, beyond Latin-1, cut short, a stray continuation byte: shown as the bytes.
     for (const std::string bytes :
          {"\xC1\x81", "\xD0\x94", "\xE2\x82\xAC", "a\xC3", "\xC3(", "\xA9"})
