@@ -9,7 +9,7 @@ out="$(mkdir -p "${1:-/tmp/pemla-shots}" && cd "${1:-/tmp/pemla-shots}" && pwd)"
 
 # Second stage: runs inside xvfb-run with the sample catalogue ready.
 if [ "${PEMLA_SHOTS_STAGE:-}" = "display" ]; then
-    PEMLA_DATA="$PEMLA_SHOTS_DATA" "$root/build-release/app/pemla-launcher" &
+    PEMLA_DATA="$PEMLA_SHOTS_DATA" "$root/build-release/app/pemla" &
     program=$!
     trap 'kill "$program" 2>/dev/null || true' EXIT
 
@@ -142,7 +142,7 @@ list "Jeux vidéo" 0 \
     "Tetris" "Game" 1 "  " T002
 put "Jeux vidéo.arn" "A#001" "!#002" "T#003"
 put export.dat "$data/reports" " 1 " " 0 " " 1 " " 0 " " 1 " " 1 " "10" "Top"
-# The launcher copies the supplied suggestion files into the data folder.
+# The program puts the supplied suggestion files into the data folder itself.
 
 PEMLA_SHOTS_STAGE=display PEMLA_SHOTS_DATA="$data" \
     xvfb-run -a -s "-screen 0 1024x768x24" "$0" "$out"
