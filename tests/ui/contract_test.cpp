@@ -306,8 +306,11 @@ TEST(QtTextEntry, TextTheFilesCannotHoldIsRefusedWholeWithABeep) {
     EXPECT_EQ(std::make_tuple(box.text(), beeps), std::make_tuple("a\xE9\xE4\xD8\xDF", 4));
     // A control character the program put there does not stop further typing.
     box.setText("tab\there");
+    combo.setText("tab\there");
     typeText(edit, "!");
-    EXPECT_EQ(std::make_tuple(box.text(), beeps), std::make_tuple("tab\there!", 4));
+    typeText(b.widgetOf.at(&combo), "!");
+    EXPECT_EQ(std::make_tuple(box.text(), combo.text(), beeps),
+              std::make_tuple("tab\there!", "tab\there!", 4));
     qt::setRefusalHook(nullptr);
 }
 

@@ -311,8 +311,8 @@ bool QtComboBox::setText(const std::string& text) {
     if (combo_->isEditable()) {
         // No item is current afterwards, so Down in the box starts again at the first item
         // rather than after the one last picked.
-        if (validator_ != nullptr) validator_->setBaseline(toQt(text));
         combo_->setCurrentIndex(-1);
+        if (validator_ != nullptr) validator_->setBaseline(toQt(text));
         combo_->setEditText(toQt(text));
         return true;
     }
