@@ -67,6 +67,9 @@ void SettingsReader::skipPastDelimiter() {
 }
 
 std::string settingsValue(std::string_view value) {
+    // No line can hold a line break: such a value (a folder may have one in its name) is written
+    // empty, so it alone falls back to its default instead of moving every later value.
+    if (value.find_first_of("\r\n") != npos) return "\"\"";
     const bool cut = value.find(',') != npos ||
                      (!value.empty() && (value.front() == ' ' || value.front() == '"'));
     if (!cut) return std::string(value);

@@ -49,7 +49,8 @@ class SettingsReader {
 };
 
 // A value as written to the file: quoted, with its quotes doubled, when it holds a comma or starts
-// with a space or a quote, so it reads back whole. Other values are written as they are.
+// with a space or a quote, so it reads back whole; written empty when it holds a line break.
+// Other values are written as they are.
 std::string settingsValue(std::string_view value);
 
 // The check-box value a settings value stands for: a number, surrounding spaces ignored, rounded

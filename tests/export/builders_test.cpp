@@ -84,6 +84,10 @@ TEST(Settings, QuotesWhatTheReaderWouldCutAndReadsItBack) {
     const ExportSettings back = decodeSettings(text);
     EXPECT_EQ(std::tie(back.folder, back.checks, back.amount, back.position),
               std::tie(stored.folder, stored.checks, stored.amount, stored.position));
+    // A folder named with a line break is lost alone; the values after it stay in place.
+    const ExportSettings split = decodeSettings(encodeSettings({"/a\nb", {1, 1, 1, 1, 1, 1}}));
+    EXPECT_EQ(std::tie(split.folder, split.checks, split.amount),
+              std::make_tuple(std::string(), std::array<int, 6>{1, 1, 1, 1, 1, 1}, "10"));
 }
 
 TEST(Settings, ReadingRuleAndCheckValues) {
