@@ -7,6 +7,8 @@
 #include <cstdlib>
 #include <filesystem>
 #include <system_error>
+#include <utility>
+#include <vector>
 
 #include "app/command_line.h"
 #include "catalogue/catalogue_error.h"
@@ -66,8 +68,10 @@ void prepareDataFolder(const std::string& folder, const std::string& supplied) {
         throw catalogue::osError(folder, ENOTDIR);
     }
 
+    // Everything missing is read first, so a damaged install leaves the folder as it was.
     catalogue::Store data(folder);
     catalogue::Store origin(supplied);
+    std::vector<std::pair<std::string, std::string>> missing;
     for (const char* name : {"type.dat", "information.dat", "pemla.dat"}) {
         struct stat st {};
         if (::lstat(data.path(name).c_str(), &st) == 0) continue;
@@ -77,10 +81,12 @@ void prepareDataFolder(const std::string& folder, const std::string& supplied) {
             try {
                 bytes = origin.readBytes(name);
             } catch (const catalogue::CatalogueError& e) {
-                // The install is damaged: name the supplied file, not the missing copy.
                 throw catalogue::CatalogueError(origin.path(name), e.reason());
             }
         }
+        missing.emplace_back(name, std::move(bytes));
+    }
+    for (const auto& [name, bytes] : missing) {
         catalogue::writeFileAtomically(data.path(name), bytes);
     }
 }

@@ -24,7 +24,10 @@ void setUpApplication() {
     QApplication::setApplicationVersion(QStringLiteral(PEMLA_VERSION));
     QGuiApplication::setDesktopFileName(QStringLiteral("io.github.pemla.Pemla"));
     QApplication::setWindowIcon(programIcon());
-    QApplication::setFont(QFont(QStringLiteral("DejaVu Sans"), 9));
+    // The windows are drawn for this family; the size stays the one the desktop asks for.
+    QFont font(QStringLiteral("DejaVu Sans"));
+    font.setPointSizeF(QApplication::font().pointSizeF());
+    QApplication::setFont(font);
 }
 
 QIcon programIcon() {

@@ -10,7 +10,7 @@ class QWidget;
 namespace app {
 
 // Names the program for the desktop (so task bars find its .desktop entry and icon) and gives
-// every window the program's icon and font. Needs the QApplication.
+// every window the program's icon and font, at the desktop's font size. Needs the QApplication.
 void setUpApplication();
 
 // The program's icon, drawn from its built-in picture.
