@@ -10,6 +10,7 @@
 
 #include "catalogue/catalogue_error.h"
 #include "catalogue/csv.h"
+#include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/list_import.h"
@@ -29,6 +30,23 @@ using catalogue::latin1ToUtf8;
 struct Failure {
     std::string message;
 };
+
+// A catalogue file's failure; the file's name is already the file system's (UTF-8) bytes.
+std::string fileError(const catalogue::CatalogueError& e) {
+    return "The file \"" + e.file() + "\" could not be used: " + e.reason() + ".";
+}
+
+// The catalogue as the window's start-up leaves it: an interrupted save finished, and the files
+// of lists saved by earlier builds under today's names (when that fails, the list in question
+// fails later with its file named).
+void openCatalogue(catalogue::Store& store, std::ostream& err) {
+    store.recover();
+    try {
+        catalogue::renameLegacyListFiles(store, store.readLines("pemla.dat"));
+    } catch (const catalogue::CatalogueError& e) {
+        err << "pemla: " << fileError(e) << '\n';
+    }
+}
 
 // The list name typed on the command line, as the catalogue's ISO-8859-1 bytes.
 std::string listName(const std::string& typed) {
@@ -55,19 +73,12 @@ std::string listedName(catalogue::Store& store, const std::string& name) {
                   store.folder() + "\"."};
 }
 
-// A catalogue file's failure; the file's name is a list's ISO-8859-1 name.
-std::string fileError(const catalogue::CatalogueError& e) {
-    return "The file \"" + latin1ToUtf8(e.file()) + "\" could not be used: " + e.reason() + ".";
-}
-
 // The report's choices: the export dialog's saved ones, or its defaults when none are saved.
 exporting::ReportChoices savedChoices(catalogue::Store& store) {
     exporting::ExportSettings settings;
     try {
         if (store.exists(exporting::kSettingsFile)) {
-            if (auto saved = exporting::decodeSettings(store.readBytes(exporting::kSettingsFile))) {
-                settings = *saved;
-            }
+            settings = exporting::decodeSettings(store.readBytes(exporting::kSettingsFile));
         }
     } catch (const catalogue::CatalogueError&) {
         // Unreadable settings: the dialog falls back to its defaults too.
@@ -142,7 +153,7 @@ int exportCommand(const CommandLine& line, const std::string& folder, std::ostre
                   std::ostream& err) {
     try {
         catalogue::Store store(folder);
-        store.recover();
+        openCatalogue(store, err);
         const std::string list = listedName(store, listName(line.list));
         const std::string bytes = exportBytes(line, store, list, err);
         if (line.outputFile) {
@@ -171,7 +182,7 @@ int importCommand(const CommandLine& line, const std::string& folder, std::ostre
         const std::string name = listName(line.list);
         const std::string csv = readWholeFile(line.file);
         catalogue::Store store(folder);
-        store.recover();
+        openCatalogue(store, err);
         const catalogue::ImportResult result = catalogue::importCsv(store, name, csv);
         if (!result.problem.empty()) throw Failure{latin1ToUtf8(result.problem)};
         for (const auto& refused : result.refused) {

@@ -132,7 +132,7 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     Label_find = caption(w);
     Label_find->setText(QStringLiteral("&Find title:"));
     Text_find = new QLineEdit(w);
-    Text_find->setValidator(new ui::qt::Latin1Validator(Text_find));
+    Text_find->setValidator(new ui::qt::StorableTextValidator(Text_find));
     Text_find->setClearButtonEnabled(true);
     a_ = std::make_unique<Adapters>(*this);
     layOut();

@@ -5,6 +5,8 @@
 #include <cerrno>
 #include <string>
 
+#include "catalogue/file_names.h"
+
 namespace catalogue {
 
 bool isPortableName(std::string_view name) {
@@ -19,7 +21,7 @@ bool isPortableName(std::string_view name) {
 
 bool probeFileName(Store& store, std::string_view name) {
     if (!isPortableName(name)) return false;
-    const std::string probe = store.path(std::string(name) + std::string(kProbeSuffix));
+    const std::string probe = store.path(fileSystemName(name) + std::string(kProbeSuffix));
     Sys& sys = store.sys();
     // Exclusive creation: a file of that name that the user already has is left as it is, and
     // its presence is itself proof that the name is accepted.

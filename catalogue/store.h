@@ -28,15 +28,18 @@ class Transaction {
     void write(const std::string& name, std::string_view text);
     // Plans `name` to be deleted; a file that does not exist is no error.
     void remove(const std::string& name);
+    // Plans the file `from` to be renamed to `to`, its bytes untouched.
+    void rename(const std::string& from, const std::string& to);
     // Carries out every planned change, all or nothing. A later plan for the same name replaces
     // an earlier one.
     void commit();
 
   private:
+    enum class Kind { Write, Remove, Rename };
     struct Action {
         std::string name;
-        bool isWrite;
-        std::string bytes;
+        Kind kind;
+        std::string bytes;  // the new content, or the file renamed to `name`
     };
     Store& store_;
     std::vector<Action> actions_;
@@ -49,8 +52,9 @@ class Store {
     const std::string& folder() const { return folder_; }
     Sys& sys() { return sys_; }
 
-    // Full path of a file of the folder. Throws CatalogueError for a name that is no plain file
-    // name: empty, "." or "..", or holding "/" or a NUL byte.
+    // Full path of a file of the folder. Names are the file system's bytes (see file_names.h).
+    // Throws CatalogueError for a name that is no plain file name: empty, "." or "..", or holding
+    // "/" or a NUL byte.
     std::string path(std::string_view name) const;
 
     // The file's raw bytes. Throws when it cannot be opened or read.

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/file_names.h"
 #include "export/last_added.h"
 #include "export/list_report.h"
 
@@ -92,51 +93,45 @@ std::string Form_Export::workingFolder() const {
 }
 
 void Form_Export::LoadSettings() {
-    if (loadSettingsFile()) return;
-    std::vector<std::string> defaults;
-    if (const std::string home = homeFolder(); !home.empty()) defaults.push_back(home);
-    defaults.push_back(workingFolder());
-    for (const std::string& folder : defaults) {
-        try {
-            catalogue::Transaction t = store_.begin();
-            t.write(kSettingsFile, defaultSettingsText(folder));
-            t.commit();
-        } catch (const CatalogueError&) {
-            break;  // the file cannot be replaced: the defaults go straight into the controls
-        }
-        if (loadSettingsFile()) return;
-    }
-    for (const std::string& folder : defaults) {
-        ExportSettings fallback;
-        fallback.folder = folder;
-        if (applySettings(fallback)) return;
-    }
-}
-
-bool Form_Export::loadSettingsFile() {
-    std::optional<ExportSettings> settings;
+    std::optional<ExportSettings> stored;
     try {
-        if (!store_.exists(kSettingsFile)) return false;
-        settings = decodeSettings(store_.readBytes(kSettingsFile));
+        if (store_.exists(kSettingsFile)) stored = decodeSettings(store_.readBytes(kSettingsFile));
     } catch (const CatalogueError&) {
-        return false;
     }
-    return settings && applySettings(*settings);
-}
-
-bool Form_Export::applySettings(const ExportSettings& settings) {
-    if (!settings.folder.starts_with('/')) return false;
-    const std::string drive = driveOf(c_.Drive1.drives(), resolved(settings.folder));
-    if (drive.empty()) return false;
-    loading_ = true;
-    const bool driveSet = c_.Drive1.setDrive(drive);
-    loading_ = false;
-    if (!driveSet || !c_.Dir1.setPath(settings.folder)) return false;
+    ExportSettings settings = stored.value_or(ExportSettings{});
+    // A value that cannot be used costs only itself: the folder falls back to the home folder,
+    // else the working folder, and the other values keep what was read.
+    if (!applyFolder(settings.folder)) {
+        std::vector<std::string> defaults;
+        if (const std::string home = homeFolder(); !home.empty()) defaults.push_back(home);
+        defaults.push_back(workingFolder());
+        for (const std::string& folder : defaults) {
+            if (applyFolder(folder)) break;
+        }
+    }
     ui::CheckBox* boxes[] = {&c_.Checkart,  &c_.Checkhtml, &c_.Checkcounter,
                              &c_.Checkdate, &c_.Checkline, &c_.Check_lastadd};
     for (std::size_t i = 0; i < settings.checks.size(); ++i) boxes[i]->setValue(settings.checks[i]);
     c_.Text2.setText(settings.amount);
-    return c_.Combo1.setText(settings.position);
+    if (!c_.Combo1.setText(settings.position)) c_.Combo1.setText(ExportSettings{}.position);
+    if (stored) return;
+    try {
+        catalogue::Transaction t = store_.begin();
+        t.write(kSettingsFile, defaultSettingsText(c_.Dir1.path()));
+        t.commit();
+    } catch (const CatalogueError&) {
+        // The file cannot be written here: the defaults stay in the controls all the same.
+    }
+}
+
+bool Form_Export::applyFolder(const std::string& folder) {
+    if (!folder.starts_with('/')) return false;
+    const std::string drive = driveOf(c_.Drive1.drives(), resolved(folder));
+    if (drive.empty()) return false;
+    loading_ = true;
+    const bool driveSet = c_.Drive1.setDrive(drive);
+    loading_ = false;
+    return driveSet && c_.Dir1.setPath(folder);
 }
 
 void Form_Export::SaveSettings() {
@@ -190,9 +185,10 @@ void Form_Export::RunExport() {
             std::string folder = c_.Dir1.path();
             if (!folder.ends_with('/')) folder.push_back('/');
             c_.Text1.setText(folder);
-            const std::string out = c_.Text1.text();
+            // The folder is the file system's bytes; the list name is converted to match them.
+            const std::string out = folder + catalogue::fileSystemName(list);
             const bool html = c_.Checkhtml.value() == 1;
-            catalogue::writeFileAtomically(out + list + (html ? ".html" : ".TXT"),
+            catalogue::writeFileAtomically(out + (html ? ".html" : ".TXT"),
                                            reportFileBytes(list, report, html), store_.sys());
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);

@@ -2,6 +2,7 @@
 
 #include "catalogue/catalogue_error.h"
 #include "catalogue/csv.h"
+#include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
@@ -43,7 +44,8 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list,
 
     // The top text is optional: a file that is missing or cannot be read is simply left out.
     try {
-        if (auto top = store.readTextIfExists(list + ".top")) report.insert(0, *top);
+        if (auto top = store.readTextIfExists(catalogue::fileSystemName(list) + ".top"))
+            report.insert(0, *top);
     } catch (const catalogue::CatalogueError&) {
     }
 

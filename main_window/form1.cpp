@@ -3,6 +3,7 @@
 #include <filesystem>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/file_names.h"
 
 namespace main_window {
 
@@ -58,14 +59,19 @@ void Form1::Form_Load() {
         store_.recover();
         fillSuggestions("type.dat", c_.Combo1);
         fillSuggestions("information.dat", c_.Combo3);
+        // Lists saved by earlier builds carry Latin-1 file names; they move to today's names
+        // together. Should that fail, the start goes on and each such list says so when opened.
+        const std::vector<std::string> lists = store_.readLines("pemla.dat");
+        guarded([&] { catalogue::renameLegacyListFiles(store_, lists); });
         LoadListNames();
         return;
     } catch (const CatalogueError& error) {
         std::error_code ec;
         const std::string folder =
             std::filesystem::absolute(store_.folder(), ec).lexically_normal();
-        platform_.messageBox("Pemla cannot start: the file \"" + error.file() +
-                                 "\" in the folder \"" + folder + "\" cannot be used (" +
+        platform_.messageBox("Pemla cannot start: the file \"" +
+                                 catalogue::shownName(error.file()) + "\" in the folder \"" +
+                                 catalogue::shownName(folder) + "\" cannot be used (" +
                                  error.reason() + ").",
                              16, "Error");
     }
@@ -137,8 +143,9 @@ void Form1::guarded(const std::function<void()>& body) {
 }
 
 void Form1::showError(const std::string& file, const std::string& reason) {
-    platform_.messageBox("The file \"" + file + "\" could not be used:\r\n" + reason + ".", 16,
-                         "Error");
+    platform_.messageBox(
+        "The file \"" + catalogue::shownName(file) + "\" could not be used:\r\n" + reason + ".", 16,
+        "Error");
 }
 
 }  // namespace main_window

@@ -2,8 +2,10 @@
 // handlers holds when a user clicks and types.
 #include <gtest/gtest.h>
 
+#include <QApplication>
 #include <QComboBox>
 #include <QElapsedTimer>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -71,10 +73,11 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     EXPECT_EQ(w.view.List1->count(), 1);
     EXPECT_EQ(w.view.Label2->text(), QStringLiteral("... amount:  1 ..."));
 
-    // Add "Abbey Road" of type Music CD, 2 discs.
+    // Add "Abbey Road" of type Music CD, 2 discs: "2" typed over the selected "Disc(s)" fits
+    // the limit of six.
     w.typeInto(w.view.Text1, QStringLiteral("Abbey Road"));
     w.view.Combo1->setCurrentIndex(0);
-    w.view.Combo2->lineEdit()->clear();
+    w.view.Combo2->lineEdit()->selectAll();
     w.typeInto(w.view.Combo2, QStringLiteral("2"));
     w.click(w.view.Command_add);
     EXPECT_EQ(folder.get("Music.dat"),
@@ -85,6 +88,9 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     ASSERT_EQ(w.view.List1->count(), 2);
     EXPECT_EQ(w.view.List1->item(0)->text(), QStringLiteral("Abbey Road"));
     EXPECT_TRUE(w.view.Text1->text().isEmpty());
+    // After the reset, Down starts again at the first suggestion.
+    QTest::keyClick(w.view.Combo1, Qt::Key_Down);
+    EXPECT_EQ(w.view.Combo1->currentText(), QStringLiteral("Music CD"));
 
     // Select it, change its discs, confirm.
     answerAll(ui::Answer::Yes);
