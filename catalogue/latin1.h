@@ -5,14 +5,12 @@
 #include <string_view>
 #include <vector>
 
+#include "list_order/list_order.h"
+
 // ISO-8859-1 case handling, in one place. Every lookup that ignores letter case goes through here.
 namespace catalogue {
 
-// Folds one Latin-1 byte to lower case: A-Z and the accented capitals 0xC0-0xDE except 0xD7.
-inline unsigned char foldByte(unsigned char c) {
-    if ((c >= 'A' && c <= 'Z') || (c >= 0xC0 && c <= 0xDE && c != 0xD7)) return c + 0x20;
-    return c;
-}
+using list_order::foldByte;
 
 // Upper case of one Latin-1 byte: a-z and the accented small letters 0xE0-0xFE except 0xF7.
 inline unsigned char upperByte(unsigned char c) {
@@ -27,10 +25,8 @@ bool equalsIgnoreCase(std::string_view a, std::string_view b);
 // Linear on average, so it is safe on the largest entry texts.
 std::size_t findIgnoreCase(std::string_view hay, std::string_view needle, std::size_t from = 0);
 
-// Ordering used by every list box: case-insensitive, ties broken by byte value.
-bool itemLess(std::string_view a, std::string_view b);
-
-// Sorts items into the list-box order. Folds each item once, so long lists sort quickly.
-void sortItems(std::vector<std::string>& items);
+// The list boxes' order, which reports and checks of stored files share.
+using list_order::itemLess;
+using list_order::sortItems;
 
 }  // namespace catalogue

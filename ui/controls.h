@@ -6,7 +6,8 @@
 
 // The window controls the program's windows are written against. Text is ISO-8859-1 bytes, the
 // same bytes the files hold, so every length counts characters. Two backends implement these:
-// ui/memory for tests and ui/qt for the real program; one contract test suite holds them alike.
+// in-memory ones for tests (tests/support/memory) and ui/qt for the real program; one contract
+// test suite holds them alike.
 namespace ui {
 
 using Handler = std::function<void()>;

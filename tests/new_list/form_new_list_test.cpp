@@ -11,8 +11,8 @@
 #include <memory>
 
 #include "tests/support/faulty_sys.h"
+#include "tests/support/memory/memory_controls.h"
 #include "tests/support/memory_form1.h"
-#include "ui/memory/memory_controls.h"
 
 namespace {
 

@@ -8,8 +8,8 @@
 #include <optional>
 
 #include "catalogue/records.h"
+#include "tests/support/memory/memory_controls.h"
 #include "tests/support/memory_form1.h"
-#include "ui/memory/memory_controls.h"
 
 namespace {
 

@@ -5,7 +5,7 @@
 
 #include "export/form_export.h"
 #include "new_list/form_new_list.h"
-#include "ui/memory/memory_controls.h"
+#include "tests/support/memory/memory_controls.h"
 
 namespace test_support {
 

@@ -4,8 +4,8 @@
 
 #include "catalogue/store.h"
 #include "main_window/form1.h"
+#include "tests/support/memory/memory_controls.h"
 #include "tests/support/temp_folder.h"
-#include "ui/memory/memory_controls.h"
 
 namespace test_support {
 

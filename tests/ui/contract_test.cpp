@@ -18,7 +18,7 @@
 #include <memory>
 #include <tuple>
 
-#include "ui/memory/memory_controls.h"
+#include "tests/support/memory/memory_controls.h"
 #include "ui/qt/qt_controls.h"
 #include "ui/qt/qt_folders.h"
 #include "ui/qt/qt_platform.h"

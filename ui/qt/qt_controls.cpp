@@ -12,7 +12,7 @@
 #include <QWidget>
 #include <algorithm>
 
-#include "catalogue/latin1.h"
+#include "list_order/list_order.h"
 
 namespace ui::qt {
 
@@ -21,7 +21,7 @@ namespace {
 bool ending = false;
 
 bool lessItem(const std::string& a, const std::string& b) {
-    return catalogue::itemLess(a, b);
+    return list_order::itemLess(a, b);
 }
 
 std::function<void()>& refusalHook() {
@@ -181,7 +181,7 @@ void QtListBox::addItem(const std::string& text) {
 }
 
 void QtListBox::setItems(std::vector<std::string> items) {
-    catalogue::sortItems(items);
+    list_order::sortItems(items);
     byCode_ = true;
     list_->clearSelection();
     if (!applyFewChanges(items)) {
@@ -217,7 +217,7 @@ bool QtListBox::applyFewChanges(const std::vector<std::string>& items) {
         if (i < items_.size() && j < items.size() && items_[i] == items[j]) {
             ++i, ++j, ++row;
         } else if (j >= items.size() ||
-                   (i < items_.size() && catalogue::itemLess(items_[i], items[j]))) {
+                   (i < items_.size() && list_order::itemLess(items_[i], items[j]))) {
             changes.push_back({row, nullptr});
             ++i;
         } else {

@@ -1,11 +1,11 @@
-#include "ui/memory/memory_controls.h"
+#include "tests/support/memory/memory_controls.h"
 
 #include <algorithm>
 #include <filesystem>
 #include <stdexcept>
 #include <utility>
 
-#include "catalogue/latin1.h"
+#include "list_order/list_order.h"
 
 namespace ui::memory {
 
@@ -14,7 +14,7 @@ namespace {
 const TextBox* focused = nullptr;
 
 bool lessItem(const std::string& a, const std::string& b) {
-    return catalogue::itemLess(a, b);
+    return list_order::itemLess(a, b);
 }
 
 }  // namespace
@@ -50,7 +50,7 @@ void MemoryListBox::addItem(const std::string& text) {
 }
 
 void MemoryListBox::setItems(std::vector<std::string> items) {
-    catalogue::sortItems(items);
+    list_order::sortItems(items);
     items_ = std::move(items);
     selected_ = -1;
 }
