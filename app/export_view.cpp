@@ -199,9 +199,24 @@ void ExportView::layOut() {
 
 exporting::Form_ExportControls ExportView::controls() {
     Adapters& a = *a_;
-    return {a.window,   a.Label1,    a.Dir1,         a.Drive1,    a.Command1,     a.Command2,
-            a.Checkart, a.Checkhtml, a.Checkcounter, a.Checkdate, a.Checkline,    a.Check_lastadd,
-            a.Label2,   a.Text2,     a.Label3,       a.Combo1,    a.Check_noinfo, a.Text1};
+    return {.window = a.window,
+            .Label1 = a.Label1,
+            .Dir1 = a.Dir1,
+            .Drive1 = a.Drive1,
+            .Command1 = a.Command1,
+            .Command2 = a.Command2,
+            .Checkart = a.Checkart,
+            .Checkhtml = a.Checkhtml,
+            .Checkcounter = a.Checkcounter,
+            .Checkdate = a.Checkdate,
+            .Checkline = a.Checkline,
+            .Check_lastadd = a.Check_lastadd,
+            .Label2 = a.Label2,
+            .Text2 = a.Text2,
+            .Label3 = a.Label3,
+            .Combo1 = a.Combo1,
+            .Check_noinfo = a.Check_noinfo,
+            .Text1 = a.Text1};
 }
 
 }  // namespace app

@@ -250,11 +250,27 @@ void MainWindowView::connectFinder(main_window::TitleFinder& finder) {
 
 main_window::Form1Controls MainWindowView::controls() {
     Adapters& a = *a_;
-    return {a.window,        a.Label1, a.List_list,      a.Command_create,   a.Command_delete,
-            a.Label2,        a.List1,  a.Command_search, a.Command_delentry, a.Command_export,
-            a.Command_print, a.Label4, a.Text1,          a.Combo1,           a.Combo2,
-            a.Combo3,        a.Label3, a.Textart,        a.Command_add,      a.Command_change,
-            a.Command_clear};
+    return {.window = a.window,
+            .Label1 = a.Label1,
+            .List_list = a.List_list,
+            .Command_create = a.Command_create,
+            .Command_delete = a.Command_delete,
+            .Label2 = a.Label2,
+            .List1 = a.List1,
+            .Command_search = a.Command_search,
+            .Command_delentry = a.Command_delentry,
+            .Command_export = a.Command_export,
+            .Command_print = a.Command_print,
+            .Label4 = a.Label4,
+            .Text1 = a.Text1,
+            .Combo1 = a.Combo1,
+            .Combo2 = a.Combo2,
+            .Combo3 = a.Combo3,
+            .Label3 = a.Label3,
+            .Textart = a.Textart,
+            .Command_add = a.Command_add,
+            .Command_change = a.Command_change,
+            .Command_clear = a.Command_clear};
 }
 
 }  // namespace app

@@ -79,7 +79,12 @@ NewListView::~NewListView() = default;
 
 new_list::Form_new_listControls NewListView::controls() {
     Adapters& a = *a_;
-    return {a.window, a.Label1, a.Text1, a.Check_info, a.Command1, a.Command2};
+    return {.window = a.window,
+            .Label1 = a.Label1,
+            .Text1 = a.Text1,
+            .Check_info = a.Check_info,
+            .Command1 = a.Command1,
+            .Command2 = a.Command2};
 }
 
 }  // namespace app

@@ -71,7 +71,12 @@ SearchView::~SearchView() = default;
 
 search::Form_searchartControls SearchView::controls() {
     Adapters& a = *a_;
-    return {a.window, a.Text1, a.Label1, a.Command_search, a.Command_cancel, a.Text2};
+    return {.window = a.window,
+            .Text1 = a.Text1,
+            .Label1 = a.Label1,
+            .Command_search = a.Command_search,
+            .Command_cancel = a.Command_cancel,
+            .Text2 = a.Text2};
 }
 
 }  // namespace app

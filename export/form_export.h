@@ -13,24 +13,24 @@
 namespace exporting {
 
 struct Form_ExportControls {
-    ui::Window& window;
-    ui::Label& Label1;
-    ui::DirList& Dir1;
-    ui::DriveList& Drive1;
-    ui::Button& Command1;
-    ui::Button& Command2;
-    ui::CheckBox& Checkart;
-    ui::CheckBox& Checkhtml;
-    ui::CheckBox& Checkcounter;
-    ui::CheckBox& Checkdate;
-    ui::CheckBox& Checkline;
-    ui::CheckBox& Check_lastadd;
-    ui::Label& Label2;
-    ui::TextBox& Text2;
-    ui::Label& Label3;
-    ui::ComboBox& Combo1;  // pick-only
-    ui::CheckBox& Check_noinfo;
-    ui::TextBox& Text1;
+    ui::Window& window;           // the dialog
+    ui::Label& Label1;            // "Output path:" caption
+    ui::DirList& Dir1;            // output folder
+    ui::DriveList& Drive1;        // drive of the output folder
+    ui::Button& Command1;         // Export
+    ui::Button& Command2;         // Cancel
+    ui::CheckBox& Checkart;       // include article numbers
+    ui::CheckBox& Checkhtml;      // save as HTML
+    ui::CheckBox& Checkcounter;   // include counter
+    ui::CheckBox& Checkdate;      // include date
+    ui::CheckBox& Checkline;      // separator lines
+    ui::CheckBox& Check_lastadd;  // include the last added
+    ui::Label& Label2;            // "Amount of last added" caption
+    ui::TextBox& Text2;           // amount of last added
+    ui::Label& Label3;            // caption of the placement choice
+    ui::ComboBox& Combo1;         // last added at Top or Bottom (pick-only)
+    ui::CheckBox& Check_noinfo;   // leave out the information column
+    ui::TextBox& Text1;           // folder the last report went to
 };
 
 inline constexpr const char* kForm_ExportCaption = "Export list";

@@ -13,27 +13,27 @@
 namespace main_window {
 
 struct Form1Controls {
-    ui::Window& window;
-    ui::Label& Label1;
-    ui::ListBox& List_list;
-    ui::Button& Command_create;
-    ui::Button& Command_delete;
-    ui::Label& Label2;
-    ui::ListBox& List1;
-    ui::Button& Command_search;
-    ui::Button& Command_delentry;
-    ui::Button& Command_export;
-    ui::Button& Command_print;
-    ui::Label& Label4;
-    ui::TextBox& Text1;
-    ui::ComboBox& Combo1;
-    ui::ComboBox& Combo2;
-    ui::ComboBox& Combo3;
-    ui::Label& Label3;
-    ui::TextBox& Textart;
-    ui::Button& Command_add;
-    ui::Button& Command_change;
-    ui::Button& Command_clear;
+    ui::Window& window;            // the main window
+    ui::Label& Label1;             // "Current lists" caption
+    ui::ListBox& List_list;        // the list names
+    ui::Button& Command_create;    // Create new list
+    ui::Button& Command_delete;    // Delete list
+    ui::Label& Label2;             // amount of titles
+    ui::ListBox& List1;            // the open list's titles
+    ui::Button& Command_search;    // Search Art#
+    ui::Button& Command_delentry;  // Delete entry
+    ui::Button& Command_export;    // Export pemla
+    ui::Button& Command_print;     // Exit
+    ui::Label& Label4;             // column header above the titles
+    ui::TextBox& Text1;            // title
+    ui::ComboBox& Combo1;          // type
+    ui::ComboBox& Combo2;          // discs
+    ui::ComboBox& Combo3;          // information
+    ui::Label& Label3;             // "Art #" caption
+    ui::TextBox& Textart;          // article number (read-only)
+    ui::Button& Command_add;       // Add
+    ui::Button& Command_change;    // Change
+    ui::Button& Command_clear;     // Reset
 };
 
 // The dialogs the main window opens; any may be missing.

@@ -10,12 +10,12 @@
 namespace new_list {
 
 struct Form_new_listControls {
-    ui::Window& window;
-    ui::Label& Label1;
-    ui::TextBox& Text1;
-    ui::CheckBox& Check_info;
-    ui::Button& Command1;
-    ui::Button& Command2;
+    ui::Window& window;        // the dialog
+    ui::Label& Label1;         // prompt
+    ui::TextBox& Text1;        // name of the new list
+    ui::CheckBox& Check_info;  // include information column
+    ui::Button& Command1;      // Create
+    ui::Button& Command2;      // Cancel
 };
 
 inline constexpr const char* kNewListCaption = "Create new list";

@@ -13,12 +13,12 @@
 namespace search {
 
 struct Form_searchartControls {
-    ui::Window& window;
-    ui::TextBox& Text1;
-    ui::Label& Label1;
-    ui::Button& Command_search;
-    ui::Button& Command_cancel;
-    ui::TextBox& Text2;
+    ui::Window& window;          // the dialog
+    ui::TextBox& Text1;          // article number to find
+    ui::Label& Label1;           // hint
+    ui::Button& Command_search;  // Search
+    ui::Button& Command_cancel;  // Cancel
+    ui::TextBox& Text2;          // title found
 };
 
 inline constexpr const char* kSearchCaption = "Search article number";
