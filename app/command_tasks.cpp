@@ -10,6 +10,7 @@
 
 #include "catalogue/catalogue_error.h"
 #include "catalogue/csv.h"
+#include "catalogue/entry_rules.h"
 #include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
@@ -42,7 +43,7 @@ std::string fileError(const catalogue::CatalogueError& e) {
 void openCatalogue(catalogue::Store& store, std::ostream& err) {
     store.recover();
     try {
-        catalogue::renameLegacyListFiles(store, store.readLines("pemla.dat"));
+        catalogue::renameLegacyListFiles(store, store.readLines(catalogue::kIndexFile));
     } catch (const catalogue::CatalogueError& e) {
         err << "pemla: " << fileError(e) << '\n';
     }
@@ -66,7 +67,7 @@ std::string listName(const std::string& typed) {
 
 // The index's spelling of a listed name (ignoring case).
 std::string listedName(catalogue::Store& store, const std::string& name) {
-    for (const std::string& line : store.readLines("pemla.dat")) {
+    for (const std::string& line : store.readLines(catalogue::kIndexFile)) {
         if (catalogue::equalsIgnoreCase(line, name)) return line;
     }
     throw Failure{"There is no list \"" + latin1ToUtf8(name) + "\" in the data folder \"" +

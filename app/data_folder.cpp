@@ -12,6 +12,7 @@
 
 #include "app/command_line.h"
 #include "catalogue/catalogue_error.h"
+#include "catalogue/entry_rules.h"
 #include "catalogue/store.h"
 
 namespace app {
@@ -72,12 +73,12 @@ void prepareDataFolder(const std::string& folder, const std::string& supplied) {
     catalogue::Store data(folder);
     catalogue::Store origin(supplied);
     std::vector<std::pair<std::string, std::string>> missing;
-    for (const char* name : {"type.dat", "information.dat", "pemla.dat"}) {
+    for (const char* name : {"type.dat", "information.dat", catalogue::kIndexFile}) {
         struct stat st {};
         if (::lstat(data.path(name).c_str(), &st) == 0) continue;
         if (errno != ENOENT) throw catalogue::osError(name, errno);
         std::string bytes;
-        if (std::string_view(name) != "pemla.dat") {
+        if (std::string_view(name) != catalogue::kIndexFile) {
             try {
                 bytes = origin.readBytes(name);
             } catch (const catalogue::CatalogueError& e) {

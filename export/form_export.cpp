@@ -167,7 +167,7 @@ std::string Form_Export::BuildReport(const std::string& list) {
     if (report.flag == 0) c_.Check_noinfo.setValue(1);
     if (report.lastAddedRefused) {
         c_.Check_lastadd.setValue(0);
-        platform_.messageBox(kTooManyLastAdded, 16, kTooManyLastAddedTitle);
+        platform_.messageBox(kTooManyLastAdded, ui::kCritical, kTooManyLastAddedTitle);
     }
     return std::move(report.text);
 }
@@ -196,7 +196,7 @@ void Form_Export::RunExport() {
             return;
         }
     }
-    platform_.messageBox("Export done!", 64, "Done");
+    platform_.messageBox("Export done!", ui::kInformation, "Done");
 }
 
 }  // namespace exporting

@@ -3,6 +3,7 @@
 #include <filesystem>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/entry_rules.h"
 #include "catalogue/file_names.h"
 
 namespace main_window {
@@ -61,7 +62,7 @@ void Form1::Form_Load() {
         fillSuggestions("information.dat", c_.Combo3);
         // Lists saved by earlier builds carry Latin-1 file names; they move to today's names
         // together. Should that fail, the start goes on and each such list says so when opened.
-        const std::vector<std::string> lists = store_.readLines("pemla.dat");
+        const std::vector<std::string> lists = store_.readLines(catalogue::kIndexFile);
         guarded([&] { catalogue::renameLegacyListFiles(store_, lists); });
         LoadListNames();
         return;
@@ -73,7 +74,7 @@ void Form1::Form_Load() {
                                  catalogue::shownName(error.file()) + "\" in the folder \"" +
                                  catalogue::shownName(folder) + "\" cannot be used (" +
                                  error.reason() + ").",
-                             16, "Error");
+                             ui::kCritical, "Error");
     }
     platform_.endProgram(1);
 }
@@ -95,7 +96,7 @@ void Form1::LoadListNames() {
     wholeList_.clear();
     c_.List_list.clear();
     c_.List1.clear();
-    c_.List_list.setItems(store_.readLines("pemla.dat"));
+    c_.List_list.setItems(store_.readLines(catalogue::kIndexFile));
 }
 
 void Form1::Command_create_Click() {
@@ -138,14 +139,14 @@ void Form1::guarded(const std::function<void()>& body) {
     } catch (const CatalogueError& error) {
         showError(error.file(), error.reason());
     } catch (const Refusal& refusal) {
-        platform_.messageBox(refusal.prompt, 16, "Error");
+        platform_.messageBox(refusal.prompt, ui::kCritical, "Error");
     }
 }
 
 void Form1::showError(const std::string& file, const std::string& reason) {
     platform_.messageBox(
-        "The file \"" + catalogue::shownName(file) + "\" could not be used:\r\n" + reason + ".", 16,
-        "Error");
+        "The file \"" + catalogue::shownName(file) + "\" could not be used:\r\n" + reason + ".",
+        ui::kCritical, "Error");
 }
 
 }  // namespace main_window

@@ -60,7 +60,7 @@ void Form1::Command_add_Click() {
     guarded([&] {
         const catalogue::Entry entry = fieldsAsEntry();
         if (catalogue::isDuplicateTitle(ListText, entry.title)) {
-            platform_.messageBox(catalogue::kDuplicateTitle, 16, "Error");
+            platform_.messageBox(catalogue::kDuplicateTitle, ui::kCritical, "Error");
             return;
         }
         const std::string list = selectedList();
@@ -93,12 +93,13 @@ void Form1::Command_add_Click() {
 void Form1::Command_change_Click() {
     const std::optional<std::string> oldTitle = selectedTitle();
     if (!oldTitle) {
-        platform_.messageBox("Select the entry to change in the list first.", 16, "Error");
+        platform_.messageBox("Select the entry to change in the list first.", ui::kCritical,
+                             "Error");
         return;
     }
     guarded([&] {
         const catalogue::Entry entry = fieldsAsEntry();
-        if (platform_.messageBox("Are ya sure yo want to change selected entry?", 4,
+        if (platform_.messageBox("Are ya sure yo want to change selected entry?", ui::kYesNo,
                                  "Change item") != ui::Answer::Yes) {
             ResetEntryFields();
             return;
@@ -140,8 +141,8 @@ void Form1::Command_change_Click() {
 void Form1::Command_delentry_Click() {
     const std::optional<std::string> title = selectedTitle();
     if (!title) return;
-    if (platform_.messageBox("Are ya sure yo want to DELETE selected entry?", 260, "Change item") !=
-        ui::Answer::Yes) {
+    if (platform_.messageBox("Are ya sure yo want to DELETE selected entry?",
+                             ui::kYesNo | ui::kSecondDefault, "Change item") != ui::Answer::Yes) {
         return;
     }
     const std::string list = selectedList();
@@ -182,14 +183,16 @@ void Form1::Command_delentry_Click() {
 void Form1::Command_delete_Click() {
     const std::string name = selectedList();
     if (name.empty()) return;
-    if (platform_.messageBox("ARE YA SURE YA WANT TO DELETE THE SELECTED LIST?", 260, "DELETE?") !=
-            ui::Answer::Yes ||
-        platform_.messageBox("ARE YA REALLY SURE?", 308, "DELETE?") != ui::Answer::Yes) {
+    if (platform_.messageBox("ARE YA SURE YA WANT TO DELETE THE SELECTED LIST?",
+                             ui::kYesNo | ui::kSecondDefault, "DELETE?") != ui::Answer::Yes ||
+        platform_.messageBox("ARE YA REALLY SURE?",
+                             ui::kYesNo | ui::kExclamation | ui::kSecondDefault,
+                             "DELETE?") != ui::Answer::Yes) {
         return;
     }
     guarded([&] {
         catalogue::Transaction t = store_.begin();
-        std::string index = catalogue::forWriting(store_.readText("pemla.dat"));
+        std::string index = catalogue::forWriting(store_.readText(catalogue::kIndexFile));
         // Files that are already missing are simply not there to delete.
         for (const std::string& file : {catalogue::entryFile(name), catalogue::counterFile(name),
                                         catalogue::articleFile(name), catalogue::flagFile(name)}) {
@@ -203,7 +206,7 @@ void Form1::Command_delete_Click() {
             WriteEmptyList(placeholder, t);
             t.write(catalogue::flagFile(placeholder), catalogue::fileNumber(1));
         }
-        t.write("pemla.dat", catalogue::removeIndexLine(index, name));
+        t.write(catalogue::kIndexFile, catalogue::removeIndexLine(index, name));
         t.commit();
         LoadListNames();
     });

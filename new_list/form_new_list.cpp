@@ -53,7 +53,7 @@ void Form_new_list::createList() {
     if (check.refusal == catalogue::kCatalogueFull)
         throw main_window::Form1::Refusal{check.refusal};
     if (!check.refusal.empty()) {
-        platform_.messageBox(check.refusal, 16, "Error");
+        platform_.messageBox(check.refusal, ui::kCritical, "Error");
         return;
     }
     const std::string& index = check.index;

@@ -63,7 +63,7 @@ void Form_searchart::Form_Unload() {
 void Form_searchart::Command_search_Click() {
     const std::optional<std::string> title = titleBefore(ArticleText, c_.Text1.text());
     if (!title) {
-        platform_.messageBox(kNotFound, 16, "Error");
+        platform_.messageBox(kNotFound, ui::kCritical, "Error");
         return;
     }
     c_.Text2.setText(*title);

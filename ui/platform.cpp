@@ -4,25 +4,26 @@ namespace ui {
 
 MessageStyle decodeStyle(int style) {
     MessageStyle decoded;
-    decoded.buttons = (style & 7) == 4 ? MessageStyle::Buttons::YesNo : MessageStyle::Buttons::Ok;
+    decoded.buttons =
+        (style & 7) == kYesNo ? MessageStyle::Buttons::YesNo : MessageStyle::Buttons::Ok;
     switch (style & 0x70) {
-        case 16:
+        case kCritical:
             decoded.icon = MessageStyle::Icon::Critical;
             break;
-        case 32:
+        case kQuestion:
             decoded.icon = MessageStyle::Icon::Question;
             break;
-        case 48:
+        case kExclamation:
             decoded.icon = MessageStyle::Icon::Exclamation;
             break;
-        case 64:
+        case kInformation:
             decoded.icon = MessageStyle::Icon::Information;
             break;
         default:
             decoded.icon = MessageStyle::Icon::None;
             break;
     }
-    decoded.secondIsDefault = (style & 0x300) == 256;
+    decoded.secondIsDefault = (style & 0x300) == kSecondDefault;
     return decoded;
 }
 

@@ -14,8 +14,16 @@ struct MessageStyle {
     bool secondIsDefault = false;  // "No" is the default button
 };
 
-// Reads a style number: 0 OK, 4 Yes/No; +16 critical, +32 question, +48 exclamation,
-// +64 information; +256 the second button is the default.
+// Message-box style numbers; a style is a button set plus an icon plus a default button.
+inline constexpr int kOkOnly = 0;
+inline constexpr int kYesNo = 4;
+inline constexpr int kCritical = 16;
+inline constexpr int kQuestion = 32;
+inline constexpr int kExclamation = 48;
+inline constexpr int kInformation = 64;
+inline constexpr int kSecondDefault = 256;  // "No" rather than "Yes" is the default
+
+// Reads a style number into its parts.
 MessageStyle decodeStyle(int style);
 
 class Platform {
