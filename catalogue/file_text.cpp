@@ -7,16 +7,10 @@ namespace catalogue {
 
 std::vector<std::string_view> splitLines(std::string_view bytes) {
     std::vector<std::string_view> lines;
-    std::size_t start = 0;
-    while (start < bytes.size()) {
-        const std::size_t cr = bytes.find('\r', start);
-        if (cr == std::string_view::npos) {
-            lines.push_back(bytes.substr(start));
-            break;
-        }
-        lines.push_back(bytes.substr(start, cr - start));
-        start = cr + 1;
-        if (start < bytes.size() && bytes[start] == '\n') ++start;
+    for (std::size_t start = 0; start < bytes.size();) {
+        const Line line = lineAt(bytes, start);
+        lines.push_back(line.text);
+        start = line.next;
     }
     return lines;
 }
@@ -24,18 +18,10 @@ std::vector<std::string_view> splitLines(std::string_view bytes) {
 std::string toFileText(std::string_view bytes) {
     std::string text;
     text.reserve(bytes.size() + 2);
-    std::size_t start = 0;
-    while (start < bytes.size()) {
-        const std::size_t cr = bytes.find('\r', start);
-        if (cr == std::string_view::npos) {
-            text.append(bytes.substr(start));
-            text.append(kCrLf);
-            break;
-        }
-        text.append(bytes.substr(start, cr - start));
-        text.append(kCrLf);
-        start = cr + 1;
-        if (start < bytes.size() && bytes[start] == '\n') ++start;
+    for (std::size_t start = 0; start < bytes.size();) {
+        const Line line = lineAt(bytes, start);
+        text.append(line.text).append(kCrLf);
+        start = line.next;
     }
     return text;
 }
@@ -62,6 +48,27 @@ std::optional<long> firstNumber(std::string_view bytes) {
         value = value * 10 + digit;
     }
     return negative ? -value : value;
+}
+
+Decimal readDecimal(std::string_view text) {
+    Decimal d;
+    std::size_t i = 0;
+    bool negative = false;
+    if (i < text.size() && (text[i] == '-' || text[i] == '+')) negative = text[i++] == '-';
+    for (; i < text.size() && text[i] >= '0' && text[i] <= '9'; ++i) {
+        d.value = d.value * 10 + (text[i] - '0');
+        d.digits = true;
+    }
+    if (i < text.size() && text[i] == '.') {
+        double scale = 0.1;
+        for (++i; i < text.size() && text[i] >= '0' && text[i] <= '9'; ++i, scale /= 10) {
+            d.value += (text[i] - '0') * scale;
+            d.digits = true;
+        }
+    }
+    if (negative) d.value = -d.value;
+    d.end = i;
+    return d;
 }
 
 long leadingNumber(std::string_view text) {

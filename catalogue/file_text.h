@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -11,6 +12,22 @@
 namespace catalogue {
 
 inline constexpr std::string_view kCrLf = "\r\n";
+
+// One line of a file text: its bytes up to the CR, and where the next line starts.
+struct Line {
+    std::string_view text;
+    std::size_t next;
+};
+
+// The line starting at `at` by the line rule; past the end, an empty line ending there.
+inline Line lineAt(std::string_view bytes, std::size_t at) {
+    if (at >= bytes.size()) return {{}, bytes.size()};
+    std::size_t cr = bytes.find('\r', at);
+    std::size_t next = cr == std::string_view::npos ? bytes.size() : cr + 1;
+    if (cr == std::string_view::npos) cr = bytes.size();
+    if (next < bytes.size() && bytes[next] == '\n') ++next;
+    return {bytes.substr(at, cr - at), next};
+}
 
 // Splits file bytes into lines by the line rule. An empty file has no lines; a lone LF is data.
 std::vector<std::string_view> splitLines(std::string_view bytes);
@@ -26,6 +43,15 @@ std::string forWriting(std::string_view text);
 // The first number in some bytes, read as a printed integer: leading blanks skipped, an optional
 // sign, digits. Nothing when the bytes do not start with a number.
 std::optional<long> firstNumber(std::string_view bytes);
+
+// A decimal number at the start of a text: an optional sign, digits, and a point with more digits.
+// `digits` says whether any digit was read, `end` where the reading stopped.
+struct Decimal {
+    double value = 0;
+    bool digits = false;
+    std::size_t end = 0;
+};
+Decimal readDecimal(std::string_view text);
 
 // Value of the digits at the start of a text after leading spaces (0 when none): how amounts
 // typed into a text box are read.

@@ -24,9 +24,7 @@ std::optional<std::string> fieldAfter(std::string_view text, std::string_view ta
 
 // End of the line starting at `at`, past its CR LF. Lines end at CR only: a lone LF is data.
 std::size_t lineEnd(std::string_view text, std::size_t at) {
-    const std::size_t cr = text.find('\r', at);
-    if (cr == npos) return text.size();
-    return cr + 1 < text.size() && text[cr + 1] == '\n' ? cr + 2 : cr + 1;
+    return lineAt(text, at).next;
 }
 
 // The span of an entry found at `at`: up to the next title line, or the end of the text.

@@ -84,25 +84,10 @@ std::string settingsValue(std::string_view value) {
 std::optional<int> checkValue(std::string_view value) {
     value = trimmed(value);
     if (value.empty()) return 0;
-    std::size_t i = 0;
-    bool negative = false;
-    if (value[i] == '-' || value[i] == '+') negative = value[i++] == '-';
-    double number = 0;
-    bool digits = false;
-    for (; i < value.size() && value[i] >= '0' && value[i] <= '9'; ++i) {
-        number = number * 10 + (value[i] - '0');
-        digits = true;
-    }
-    if (i < value.size() && value[i] == '.') {
-        double scale = 0.1;
-        for (++i; i < value.size() && value[i] >= '0' && value[i] <= '9'; ++i, scale /= 10) {
-            number += (value[i] - '0') * scale;
-            digits = true;
-        }
-    }
-    if (!digits || i != value.size()) return std::nullopt;
+    const catalogue::Decimal number = catalogue::readDecimal(value);
+    if (!number.digits || number.end != value.size()) return std::nullopt;
     // The default rounding mode rounds a half to the even neighbour.
-    const double rounded = std::nearbyint(negative ? -number : number);
+    const double rounded = std::nearbyint(number.value);
     if (rounded == 0 || rounded == 1 || rounded == 2) return static_cast<int>(rounded);
     return std::nullopt;
 }

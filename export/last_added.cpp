@@ -11,6 +11,8 @@ namespace exporting {
 namespace {
 
 using catalogue::kCrLf;
+using catalogue::Line;
+using catalogue::lineAt;
 constexpr auto npos = std::string_view::npos;
 
 constexpr std::string_view kBanner[] = {
@@ -23,21 +25,6 @@ constexpr std::string_view kBanner[] = {
     "                    |                                     |",
 };
 static_assert(kBanner[0].size() == 77 && kBanner[4].size() == 76 && kBanner[6].size() == 59);
-
-// A line's content from `at` up to its CR, and where the next line starts.
-struct Line {
-    std::string_view text;
-    std::size_t next;
-};
-
-Line lineAt(std::string_view text, std::size_t at) {
-    if (at >= text.size()) return {{}, text.size()};
-    std::size_t cr = text.find('\r', at);
-    std::size_t next = cr == npos ? text.size() : cr + 1;
-    if (cr == npos) cr = text.size();
-    if (next < text.size() && text[next] == '\n') ++next;
-    return {text.substr(at, cr - at), next};
-}
 
 // The entry's lines after its title line are taken by position, markers untested.
 std::string_view withoutMarker(std::string_view line) {
@@ -54,19 +41,7 @@ std::string numberCell(long k) {
 double lastAddedAmount(std::string_view text) {
     std::size_t i = 0;
     while (i < text.size() && text[i] == ' ') ++i;
-    bool negative = false;
-    if (i < text.size() && (text[i] == '-' || text[i] == '+')) negative = text[i++] == '-';
-    double value = 0;
-    for (; i < text.size() && text[i] >= '0' && text[i] <= '9'; ++i) {
-        value = value * 10 + (text[i] - '0');
-    }
-    if (i < text.size() && text[i] == '.') {
-        double scale = 0.1;
-        for (++i; i < text.size() && text[i] >= '0' && text[i] <= '9'; ++i, scale /= 10) {
-            value += (text[i] - '0') * scale;
-        }
-    }
-    return negative ? -value : value;
+    return catalogue::readDecimal(text.substr(i)).value;
 }
 
 std::string lastAddedSection(std::string_view entryText, std::string_view amountText, long rows,

@@ -5,6 +5,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
 
@@ -104,11 +105,7 @@ class ArticleIndex {
         numbers_.reserve(text.size() / 9 + 1);  // an article line takes at least nine bytes
         std::size_t start = 0;
         while (start < text.size()) {
-            std::size_t cr = text.find('\r', start);
-            std::size_t end = cr == std::string_view::npos ? text.size() : cr + 1;
-            if (cr == std::string_view::npos) cr = text.size();
-            if (end < text.size() && text[end] == '\n') ++end;
-            const std::string_view line = text.substr(start, cr - start);
+            const auto [line, end] = catalogue::lineAt(text, start);
             for (std::size_t at = line.find(catalogue::kArticleSeparator);
                  at != std::string_view::npos;
                  at = line.find(catalogue::kArticleSeparator, at + 1)) {
