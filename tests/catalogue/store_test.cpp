@@ -132,7 +132,8 @@ TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFileOrKeepsTheOldOne) {
 
 const JournalPlan kPlan{{{"Rock.dat.1-1.pemla-tmp", "Rock.dat"},
                          {"Rock & Pop \xE9.art.1-2.pemla-tmp", "Rock & Pop \xE9.art"}},
-                        {"Rock.inf", "END 12"}};
+                        {"Rock.inf", "END 12"},
+                        {"Rock.del", "/out/Rock.TXT.77.pemla-tmp"}};
 
 TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
     const std::string bytes = encodeJournal(kPlan);
@@ -140,6 +141,7 @@ TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
     ASSERT_TRUE(plan);
     EXPECT_EQ(plan->renames, kPlan.renames);
     EXPECT_EQ(plan->deletions, kPlan.deletions);
+    EXPECT_EQ(plan->strays, kPlan.strays);
     for (std::size_t n = 0; n < bytes.size(); ++n) {
         EXPECT_FALSE(decodeJournal(bytes.substr(0, n))) << "prefix of " << n;
     }
@@ -154,12 +156,17 @@ TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
     EXPECT_FALSE(decodeJournal(bytes + bytes));
 }
 
+// Strays, which are removed without a question, are probes or staged copies and nothing else.
 TEST(Journal, OnlyPlainNamesOfTheFolder) {
     for (const std::string& bad : std::vector<std::string>{"../Rock.dat", "/etc/passwd", "a/b", ".",
                                                            "..", std::string("a\0b", 3), ""}) {
-        EXPECT_FALSE(decodeJournal(encodeJournal({{{"x.pemla-tmp", bad}}, {}}))) << bad;
-        EXPECT_FALSE(decodeJournal(encodeJournal({{{bad, "x.dat"}}, {}}))) << bad;
-        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {bad}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{{"x.pemla-tmp", bad}}, {}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{{bad, "x.dat"}}, {}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {bad}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {}, {bad}}))) << bad;
+    }
+    for (const char* bad : {"Rock.dat", "a.pemla-tmp", "/a/../b.pemla-tmp", "/x.del"}) {
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {}, {bad}}))) << bad;
     }
 }
 
@@ -174,7 +181,7 @@ void putHalfDone(const TempFolder& folder, std::string_view journal) {
 }
 
 const std::string kHalfDone = encodeJournal(
-    {{{"a.dat.9-1.pemla-tmp", "a.dat"}, {"b.dat.9-2.pemla-tmp", "b.dat"}}, {"c.dat"}});
+    {{{"a.dat.9-1.pemla-tmp", "a.dat"}, {"b.dat.9-2.pemla-tmp", "b.dat"}}, {"c.dat"}, {}});
 
 TEST(Recovery, FinishesACompleteJournalAndDropsATornOneWithItsStagedFiles) {
     TempFolder done, torn;
