@@ -68,6 +68,8 @@ Form_Export::Form_Export(const Form_ExportControls& controls, ui::Platform& plat
 
 void Form_Export::Form_Load() {
     form1_.controls().window.setEnabled(false);
+    // The hidden box follows the list of each run; it starts cleared at every opening.
+    c_.Check_noinfo.setValue(0);
     LoadSettings();
 }
 
@@ -155,9 +157,7 @@ void Form_Export::SaveSettings() {
 }
 
 std::string Form_Export::BuildReport(const std::string& list) {
-    const std::optional<long> flag = store_.readNumber(catalogue::flagFile(list));
-    if (flag == 1) c_.Check_noinfo.setValue(0);
-    if (flag == 0) c_.Check_noinfo.setValue(1);
+    c_.Check_noinfo.setValue(form1_.HasInformation(list) ? 0 : 1);
 
     const std::string entries = store_.readText(catalogue::entryFile(list));
     const bool articleNumbers = c_.Checkart.value() == 1;
@@ -218,10 +218,9 @@ void Form_Export::RunExport() {
             c_.Text1.setText(folder);
             const std::string out = c_.Text1.text();
             if (c_.Checkhtml.value() == 1) {
-                catalogue::writeFileAtomically(out + list + ".html", HtmlPage(list, report),
-                                               store_.sys());
+                store_.writeReport(out + list + ".html", HtmlPage(list, report));
             } else {
-                catalogue::writeFileAtomically(out + list + ".TXT", report + "\r\n", store_.sys());
+                store_.writeReport(out + list + ".TXT", report + "\r\n");
             }
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);

@@ -13,6 +13,8 @@
 #include <iostream>
 #include <sstream>
 
+#include "catalogue/folder_lock.h"
+
 namespace faults {
 
 namespace fs = std::filesystem;
@@ -21,6 +23,8 @@ using test_support::FaultySys;
 Files snapshot(const std::string& folder, const std::string& prefix) {
     Files files;
     for (const auto& item : fs::directory_iterator(folder)) {
+        // The running program's lock file is empty and carries no data.
+        if (item.path().filename() == catalogue::kLockName) continue;
         std::string& bytes = files[prefix + item.path().filename().string()];
         if (fs::is_symlink(item.symlink_status())) {
             bytes = "[link to " + fs::read_symlink(item.path()).string() + "]";
