@@ -1,7 +1,10 @@
 #include "catalogue/store.h"
 
 #include <gtest/gtest.h>
+#include <signal.h>
 #include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
@@ -10,6 +13,7 @@
 #include <vector>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/folder_lock.h"
 #include "catalogue/journal.h"
 #include "tests/support/faulty_sys.h"
 #include "tests/support/temp_folder.h"
@@ -211,6 +215,32 @@ TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
     }
     Store(folder.path()).recover();
     EXPECT_EQ(folder.get("b.dat"), "b new\r\n");
+}
+
+// The lock lives as long as the process holding it, however that process ends.
+TEST(FolderLock, HeldByOneProcessUntilItIsKilled) {
+    TempFolder folder;
+    int ready[2];
+    ASSERT_EQ(::pipe(ready), 0);
+    const pid_t holder = ::fork();
+    if (holder == 0) {
+        FolderLock lock(folder.path());
+        const char held = lock.state() == FolderLock::State::Held ? 'y' : 'n';
+        (void)::write(ready[1], &held, 1);
+        ::pause();
+        ::_exit(0);
+    }
+    char held = 0;
+    ASSERT_EQ(::read(ready[0], &held, 1), 1);
+    EXPECT_EQ(held, 'y');
+    EXPECT_EQ(FolderLock(folder.path()).state(), FolderLock::State::Taken);
+    ::kill(holder, SIGKILL);
+    ::waitpid(holder, nullptr, 0);
+    EXPECT_EQ(FolderLock(folder.path()).state(), FolderLock::State::Held);
+    // Where no lock file can be made the program runs unlocked rather than not at all.
+    EXPECT_EQ(FolderLock(folder.file("missing")).state(), FolderLock::State::Unlocked);
+    ::close(ready[0]);
+    ::close(ready[1]);
 }
 
 }  // namespace
