@@ -184,12 +184,6 @@ std::string Store::path(std::string_view name) const {
 }
 
 std::string Store::readBytes(const std::string& name, FileStamp* stamp) {
-    // A change that an earlier failure left half-done is finished before anything is read, where
-    // that can be done now; writes refuse until it is.
-    try {
-        settle();
-    } catch (const CatalogueError&) {
-    }
     return readAll(sys_, path(name), name, stamp);
 }
 
@@ -260,10 +254,10 @@ void Store::apply(const JournalPlan& plan) {
     if (changed) syncFolder();
 }
 
-void Store::settle() {
+bool Store::settle() {
     const std::string journal(kJournalName);
     struct stat st {};
-    if (::lstat(path(journal).c_str(), &st) != 0 && errno == ENOENT) return;
+    if (::lstat(path(journal).c_str(), &st) != 0 && errno == ENOENT) return false;
     try {
         // A journal that cannot be read now may still be complete: it stays, since dropping it
         // could leave a half-applied change for good.
@@ -271,11 +265,21 @@ void Store::settle() {
             decodeJournal(readAll(sys_, path(journal), journal));
         if (plan) {
             apply(*plan);
-        } else if (sys_.unlink(path(journal)) != 0 && errno != ENOENT) {
+            return !plan->renames.empty() || !plan->deletions.empty();
+        }
+        if (sys_.unlink(path(journal)) != 0 && errno != ENOENT) {
             throw osError(journal, errno);
         }
+        return false;
     } catch (const CatalogueError& error) {
         throw stuckJournal(error);
+    }
+}
+
+void Store::trySettle() {
+    try {
+        settle();
+    } catch (const CatalogueError&) {
     }
 }
 

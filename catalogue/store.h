@@ -96,8 +96,7 @@ class Store {
     std::string path(std::string_view name) const;
 
     // The file's raw bytes, and its stamp when asked. Only a regular file is read; a FIFO, a
-    // device or a folder is refused without waiting on it. Throws when it cannot be read. A
-    // pending journal is finished first where that can be done.
+    // device or a folder is refused without waiting on it. Throws when it cannot be read.
     std::string readBytes(const std::string& name, FileStamp* stamp = nullptr);
     // The file's text: every line followed by CR LF.
     std::string readText(const std::string& name);
@@ -115,9 +114,13 @@ class Store {
     // carried out again, an incomplete one is dropped) and removes stray staged files. Throws
     // when a complete journal cannot be finished; it then stays for the next try.
     void recover();
-    // Finishes or drops a pending journal, if there is one. Throws CatalogueError naming the
-    // journal when it cannot, so that nothing else is written until it is.
-    void settle();
+    // Finishes or drops a pending journal, if there is one; true when that changed catalogue
+    // files. Throws CatalogueError naming the journal when it cannot, so that nothing else is
+    // written until it is.
+    bool settle();
+    // The same for an operation that only reads: files the journal cannot finish now are left
+    // as they are.
+    void trySettle();
 
     // A new operation, after any pending journal is settled (throws as settle() does).
     Transaction begin();

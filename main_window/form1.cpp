@@ -167,10 +167,16 @@ void Form1::guarded(const std::function<void()>& body, bool busy) {
         try {
             body();
         } catch (const catalogue::ChangedOnDisk& error) {
-            prompt = "The file \"" + error.file() +
-                     "\" was changed on disk after this window read it, so nothing was "
-                     "written.\r\nThe window now shows the files as they are; please make the "
-                     "change again.";
+            prompt = error.file() == catalogue::kJournalName
+                         ? std::string(
+                               "An earlier change that was left unfinished has now been "
+                               "completed, so nothing else was done.")
+                         : "The file \"" + error.file() +
+                               "\" was changed on disk after this window read it, so nothing "
+                               "was written.";
+            prompt +=
+                "\r\nThe window now shows the files as they are; please make the change "
+                "again.";
             stale = true;
         } catch (const catalogue::UnfinishedChange& error) {
             prompt = errorText(error.file(), error.reason()) +
@@ -186,10 +192,17 @@ void Form1::guarded(const std::function<void()>& body, bool busy) {
     if (!prompt.empty()) platform_.messageBox(prompt, 16, "Error");
 }
 
+void Form1::finishEarlierChange() {
+    if (store_.settle()) {
+        throw catalogue::ChangedOnDisk(std::string(catalogue::kJournalName), "it was finished");
+    }
+}
+
 void Form1::showFilesAgain() {
     const std::string list = selectedList();
     const std::optional<std::string> title = selectedTitle();
     const std::string information = c_.Combo3.text();
+    store_.trySettle();
     guarded([&] {
         LoadListNames();
         for (int i = 0; i < c_.List_list.count(); ++i) {

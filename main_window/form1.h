@@ -140,6 +140,9 @@ class Form1 {
     void requireWholeList(const std::string& list) const;
     // Reads the lists and the open list again, keeping the selections and the typed fields.
     void showFilesAgain();
+    // Every change starts here: a change left unfinished is finished first, and when that moved
+    // files the window shows is refused (ChangedOnDisk naming the journal) and shows them again.
+    void finishEarlierChange();
 
     // The list whose entry file ListText holds whole; empty after a failed or no load.
     std::string wholeList_;

@@ -77,6 +77,7 @@ void Form1::WriteEmptyList(const std::string& name, catalogue::Transaction& t) {
 
 void Form1::Command_add_Click() {
     guarded([&] {
+        finishEarlierChange();
         const std::string list = selectedList();
         if (list.empty()) {
             // Nothing to store the entry in: the fields keep what was typed for when a list is
@@ -119,6 +120,7 @@ void Form1::Command_change_Click() {
         return;
     }
     guarded([&] {
+        finishEarlierChange();
         const catalogue::Entry entry = fieldsAsEntry();
         if (platform_.messageBox("Are ya sure yo want to change selected entry?", 4,
                                  "Change item") != ui::Answer::Yes) {
@@ -178,6 +180,7 @@ void Form1::Command_delentry_Click() {
         return;
     }
     guarded([&] {
+        finishEarlierChange();
         catalogue::Transaction t = store_.begin();
         if (wholeList_ == list) t.expect(catalogue::entryFile(list), listStamp_);
         if (c_.List1.count() == 1) {
@@ -217,6 +220,7 @@ void Form1::Command_delete_Click() {
         return;
     }
     guarded([&] {
+        finishEarlierChange();
         catalogue::Transaction t = store_.begin();
         // The window's picture of the lists, and of the list going when it is the open one.
         t.expect("pemla.dat", indexStamp_);

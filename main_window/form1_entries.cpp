@@ -11,6 +11,9 @@ using catalogue::CatalogueError;
 void Form1::List_list_Click() {
     c_.List1.clear();
     ResetEntryFields();
+    // A change left half-done is finished before the list is read, where that can be done now;
+    // otherwise the list shows its files as they are, and writes are refused until it is.
+    store_.trySettle();
     for (int i = 0; i < c_.List_list.count(); ++i) {
         if (c_.List_list.selected(i)) {
             const std::string name = c_.List_list.itemText(i);

@@ -30,6 +30,8 @@ Files snapshot(const std::string& folder, const std::string& prefix) {
             bytes = "[link to " + fs::read_symlink(item.path()).string() + "]";
         } else if (fs::is_directory(item.symlink_status())) {
             bytes = "[folder]";
+        } else if (fs::is_fifo(item.symlink_status())) {
+            bytes = "[fifo]";
         } else {
             std::ostringstream in;
             in << std::ifstream(item.path(), std::ios::binary).rdbuf();
