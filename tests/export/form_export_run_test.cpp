@@ -1,6 +1,7 @@
 // The export run on in-memory controls, writing real files into a temporary output folder.
 #include <gtest/gtest.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <filesystem>
 
@@ -139,6 +140,16 @@ TEST(ExportRun, FailuresNameTheFileAndKeepTheOlderReport) {
     EXPECT_NE(shown[0].find("Movies.TXT"), std::string::npos) << shown[0];
     EXPECT_EQ(f.out.get("Movies.TXT"), "older report\r\n");
     EXPECT_EQ(f.out.listing(), "Movies.TXT\n");
+}
+
+// The optional top text is left out when it is no file; a FIFO is never waited on.
+TEST(ExportRun, ATopTextThatIsAFifoIsLeftOutWithoutWaiting) {
+    OpenMovies f;
+    ASSERT_EQ(::mkfifo(f.main.folder.file("Movies.top").c_str(), 0644), 0);
+    ::alarm(20);  // a blocking open ends the test run here instead of hanging it
+    EXPECT_EQ(f.exportNow(), std::vector<std::string>{"Done 64: Export done!"});
+    ::alarm(0);
+    EXPECT_TRUE(f.out.get("Movies.TXT").starts_with(".[Movies]")) << f.out.get("Movies.TXT");
 }
 
 TEST(ExportRun, NoSelectedListOnlyBeeps) {
