@@ -1,6 +1,5 @@
 #include "app/dialog_window.h"
 
-#include <QIcon>
 #include <QLabel>
 #include <QPainter>
 #include <QPixmap>
@@ -34,11 +33,9 @@ QPixmap disc(int size) {
 
 }  // namespace
 
-void makeDialogWindow(QWidget* dialog, QWidget* owner, QSize size) {
+void makeDialogWindow(QWidget* dialog, QWidget* owner) {
     dialog->setWindowFlags(Qt::Dialog | Qt::WindowTitleHint | Qt::WindowCloseButtonHint |
                            Qt::CustomizeWindowHint);
-    dialog->setFixedSize(size);
-    dialog->setWindowIcon(QIcon(disc(32)));
     if (owner != nullptr) {
         // The native windows exist from here on, so the owner link holds from the first show.
         dialog->winId();

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <QSize>
-
 #include "ui/qt/qt_controls.h"
 
 class QLabel;
@@ -10,9 +8,9 @@ class QWidget;
 // What the program's dialogs share on screen.
 namespace app {
 
-// Makes `dialog` a fixed-size top-level window kept above `owner`. It gets no QWidget parent:
-// disabling the owner, as the dialogs do while they are open, would otherwise disable them too.
-void makeDialogWindow(QWidget* dialog, QWidget* owner, QSize size);
+// Makes `dialog` a top-level window kept above `owner`. It gets no QWidget parent: disabling the
+// owner, as the dialogs do while they are open, would otherwise disable them too.
+void makeDialogWindow(QWidget* dialog, QWidget* owner);
 
 // The dialogs' window adapter. Qt drops a top-level window's native window when it closes, and
 // closing a widget that has none sends no close event: a dialog whose load handler closes it again

@@ -1,20 +1,21 @@
 #include "app/export_view.h"
 
+#include <QBoxLayout>
 #include <QCheckBox>
 #include <QComboBox>
 #include <QFileSystemModel>
 #include <QFrame>
+#include <QGridLayout>
 #include <QGroupBox>
-#include <QIcon>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPainter>
 #include <QPixmap>
 #include <QPushButton>
 #include <QTreeView>
-#include <QWindow>
 
 #include "app/dialog_window.h"
+#include "app/widgets.h"
 #include "ui/qt/qt_controls.h"
 #include "ui/qt/qt_folders.h"
 
@@ -45,20 +46,23 @@ QPixmap exportPicture(int size) {
 
 }  // namespace
 
+using KeyedButton = WithAccessKey<ui::qt::QtButton, QPushButton>;
+using KeyedCheckBox = WithAccessKey<ui::qt::QtCheckBox, QCheckBox>;
+
 struct ExportView::Adapters {
     explicit Adapters(ExportView& v)
         : window(v.widget()),
           Label1(v.Label1),
           Dir1(v.Dir1),
           Drive1(v.Drive1),
-          Command1(v.Command1),
-          Command2(v.Command2),
-          Checkart(v.Checkart),
-          Checkhtml(v.Checkhtml),
-          Checkcounter(v.Checkcounter),
-          Checkdate(v.Checkdate),
-          Checkline(v.Checkline),
-          Check_lastadd(v.Check_lastadd),
+          Command1(v.Command1, "&Export"),
+          Command2(v.Command2, "&Cancel"),
+          Checkart(v.Checkart, "Include &Article number"),
+          Checkhtml(v.Checkhtml, "Save as &HTML"),
+          Checkcounter(v.Checkcounter, "Include co&unter"),
+          Checkdate(v.Checkdate, "Include &date"),
+          Checkline(v.Checkline, "Separate &line"),
+          Check_lastadd(v.Check_lastadd, "Include las&t added on the list"),
           Label2(v.Label2),
           Text2(v.Text2),
           Label3(v.Label3),
@@ -70,14 +74,14 @@ struct ExportView::Adapters {
     ui::qt::QtLabel Label1;
     ui::qt::QtDirList Dir1;
     ui::qt::QtDriveList Drive1;
-    ui::qt::QtButton Command1;
-    ui::qt::QtButton Command2;
-    ui::qt::QtCheckBox Checkart;
-    ui::qt::QtCheckBox Checkhtml;
-    ui::qt::QtCheckBox Checkcounter;
-    ui::qt::QtCheckBox Checkdate;
-    ui::qt::QtCheckBox Checkline;
-    ui::qt::QtCheckBox Check_lastadd;
+    KeyedButton Command1;
+    KeyedButton Command2;
+    KeyedCheckBox Checkart;
+    KeyedCheckBox Checkhtml;
+    KeyedCheckBox Checkcounter;
+    KeyedCheckBox Checkdate;
+    KeyedCheckBox Checkline;
+    KeyedCheckBox Check_lastadd;
     ui::qt::QtLabel Label2;
     ui::qt::QtTextBox Text2;
     ui::qt::QtLabel Label3;
@@ -94,6 +98,9 @@ ExportView::ExportView(QWidget* owner) : window_(std::make_unique<QWidget>()) {
     Label1 = new QLabel(w);
     Dir1 = new QTreeView(w);
     Drive1 = new QComboBox(w);
+    // Mount points can be long: the list asks for a usual width and shows them in full when open.
+    Drive1->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
+    Drive1->setMinimumContentsLength(16);
     Command1 = new QPushButton(w);
     Command2 = new QPushButton(w);
     Image1 = new QLabel(w);
@@ -106,7 +113,7 @@ ExportView::ExportView(QWidget* owner) : window_(std::make_unique<QWidget>()) {
     Frame1 = new QGroupBox(QStringLiteral("Add last added entries"), w);
     Check_lastadd = new QCheckBox(Frame1);
     Label2 = new QLabel(Frame1);
-    Text2 = new QLineEdit(Frame1);
+    Text2 = new ShortLineEdit(3, Frame1);
     Label3 = new QLabel(Frame1);
     Combo1 = new QComboBox(Frame1);  // not editable: the position is picked, never typed
     Check_noinfo = new QCheckBox(w);
@@ -130,16 +137,11 @@ ExportView::ExportView(QWidget* owner) : window_(std::make_unique<QWidget>()) {
                          }
                      });
 
-    w->setWindowFlags(Qt::Dialog | Qt::WindowTitleHint | Qt::WindowCloseButtonHint |
-                      Qt::CustomizeWindowHint);
-    w->setWindowIcon(QIcon(exportPicture(32)));
-    if (owner != nullptr) {
-        // Native windows exist from here on, so the dialog stays above its owner from its first
-        // show.
-        w->winId();
-        owner->winId();
-        w->windowHandle()->setTransientParent(owner->windowHandle());
-    }
+    makeDialogWindow(w, owner);
+    nameField(Dir1, "Output folder", Label1);
+    nameField(Drive1, "Drive");
+    nameField(Text2, "Amount of last added", Label2);
+    nameField(Combo1, "Place of last added", Label3);
 
     QWidget* order[] = {Dir1,      Drive1,       Command1,  Command2,      Checkart, Checkhtml,
                         Checkdate, Checkcounter, Checkline, Check_lastadd, Text2,    Combo1};
@@ -149,36 +151,50 @@ ExportView::ExportView(QWidget* owner) : window_(std::make_unique<QWidget>()) {
 ExportView::~ExportView() = default;
 
 void ExportView::layOut() {
-    const int width = 540;
-    const int height = 318;
-    window_->setFixedSize(width, height);
-    Frame2->setGeometry(6, 6, width - 12, height - 12);
+    // Left: the folder list under its caption, the drive list at the bottom; it takes the room
+    // the dialog gains. Right: the buttons beside the picture, the report options in two
+    // columns, the last-added frame.
+    auto* right = new QVBoxLayout;
+    auto* top = new QHBoxLayout;
+    auto* buttons = new QVBoxLayout;
+    buttons->addWidget(Command1);
+    buttons->addWidget(Command2);
+    top->addLayout(buttons);
+    top->addStretch();
+    top->addWidget(Image1, 0, Qt::AlignTop);
+    right->addLayout(top);
+    right->addWidget(Checkart);
+    auto* options = new QGridLayout;
+    options->addWidget(Checkhtml, 0, 0);
+    options->addWidget(Checkdate, 0, 1);
+    options->addWidget(Checkcounter, 1, 0);
+    options->addWidget(Checkline, 1, 1);
+    right->addLayout(options);
+    auto* lastAdded = new QGridLayout(Frame1);
+    lastAdded->addWidget(Check_lastadd, 0, 0, 1, 3);
+    lastAdded->addWidget(Label2, 1, 0);
+    lastAdded->addWidget(Text2, 1, 1);
+    lastAdded->addWidget(Label3, 2, 0);
+    lastAdded->addWidget(Combo1, 2, 1, 1, 2);
+    lastAdded->setColumnStretch(2, 1);
+    right->addWidget(Frame1);
+    right->addStretch();
+    for (QPushButton* button : {Command1, Command2}) button->setMinimumWidth(120);
 
-    // Left: the folder list under its caption, the drive list at the bottom.
-    Label1->setGeometry(16, 14, 220, 18);
-    Dir1->setGeometry(16, 34, 230, 236);
-    Drive1->setGeometry(16, 276, 230, 26);
-
-    // Right: the buttons, the report options in two columns, the last-added frame.
-    const int right = 262;
-    Command1->setGeometry(right, 14, 120, 28);
-    Command2->setGeometry(right, 48, 120, 28);
-    Image1->setGeometry(width - 16 - 32, 16, 32, 32);
-    Checkart->setGeometry(right, 86, 260, 22);
-    Checkhtml->setGeometry(right, 112, 130, 22);
-    Checkcounter->setGeometry(right, 136, 130, 22);
-    Checkdate->setGeometry(right + 136, 112, 124, 22);
-    Checkline->setGeometry(right + 136, 136, 124, 22);
-
-    Frame1->setGeometry(right, 168, width - right - 16, 134);
-    Check_lastadd->setGeometry(10, 24, 240, 22);
-    Label2->setGeometry(10, 58, 160, 24);
-    Text2->setGeometry(176, 58, 40, 24);
-    Label3->setGeometry(10, 94, 160, 24);
-    Combo1->setGeometry(176, 94, 80, 26);
-
-    Check_noinfo->setGeometry(right, 168, 240, 22);
-    Text1->setGeometry(right, 196, 240, 24);
+    auto* left = new QVBoxLayout;
+    left->addWidget(Label1);
+    left->addWidget(Dir1, 1);
+    left->addWidget(Drive1);
+    auto* columns = new QHBoxLayout(Frame2);
+    columns->setContentsMargins(10, 8, 10, 10);
+    columns->setSpacing(16);
+    columns->addLayout(left, 1);
+    columns->addLayout(right);
+    auto* outer = new QVBoxLayout(window_.get());
+    outer->setContentsMargins(6, 6, 6, 6);
+    outer->addWidget(Frame2);
+    Dir1->setMinimumSize(230, 200);
+    window_->resize(QSize(540, 318).expandedTo(window_->sizeHint()));
 }
 
 exporting::Form_ExportControls ExportView::controls() {

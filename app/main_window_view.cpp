@@ -1,11 +1,18 @@
 #include "app/main_window_view.h"
 
+#include <QBoxLayout>
 #include <QComboBox>
+#include <QGridLayout>
+#include <QKeySequence>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPainter>
 #include <QPushButton>
+#include <QShortcut>
+#include <algorithm>
+
+#include "app/widgets.h"
 
 namespace app {
 
@@ -48,19 +55,21 @@ QLabel* caption(QWidget* parent) {
 
 }  // namespace
 
+using KeyedButton = WithAccessKey<ui::qt::QtButton, QPushButton>;
+
 struct MainWindowView::Adapters {
     explicit Adapters(MainWindowView& v)
         : window(v.widget()),
           Label1(v.Label1),
           List_list(v.List_list),
-          Command_create(v.Command_create),
-          Command_delete(v.Command_delete),
+          Command_create(v.Command_create, "Create &new list"),
+          Command_delete(v.Command_delete, "Delete &list"),
           Label2(v.Label2),
           List1(v.List1),
-          Command_search(v.Command_search),
-          Command_delentry(v.Command_delentry),
-          Command_export(v.Command_export),
-          Command_print(v.Command_print),
+          Command_search(v.Command_search, "&Search Art#"),
+          Command_delentry(v.Command_delentry, "&Delete entry"),
+          Command_export(v.Command_export, "&Export pemla"),
+          Command_print(v.Command_print, "E&xit"),
           Label4(v.Label4),
           Text1(v.Text1),
           Combo1(v.Combo1),
@@ -68,21 +77,21 @@ struct MainWindowView::Adapters {
           Combo3(v.Combo3),
           Label3(v.Label3),
           Textart(v.Textart),
-          Command_add(v.Command_add),
-          Command_change(v.Command_change),
-          Command_clear(v.Command_clear) {}
+          Command_add(v.Command_add, "&Add"),
+          Command_change(v.Command_change, "&Change"),
+          Command_clear(v.Command_clear, "&Reset") {}
 
     ui::qt::QtWindow window;
     ui::qt::QtLabel Label1;
     ui::qt::QtListBox List_list;
-    ui::qt::QtButton Command_create;
-    ui::qt::QtButton Command_delete;
+    KeyedButton Command_create;
+    KeyedButton Command_delete;
     ui::qt::QtLabel Label2;
     ui::qt::QtListBox List1;
-    ui::qt::QtButton Command_search;
-    ui::qt::QtButton Command_delentry;
-    ui::qt::QtButton Command_export;
-    ui::qt::QtButton Command_print;
+    KeyedButton Command_search;
+    KeyedButton Command_delentry;
+    KeyedButton Command_export;
+    KeyedButton Command_print;
     ui::qt::QtLabel Label4;
     ui::qt::QtTextBox Text1;
     ui::qt::QtComboBox Combo1;
@@ -90,9 +99,9 @@ struct MainWindowView::Adapters {
     ui::qt::QtComboBox Combo3;
     ui::qt::QtLabel Label3;
     ui::qt::QtTextBox Textart;
-    ui::qt::QtButton Command_add;
-    ui::qt::QtButton Command_change;
-    ui::qt::QtButton Command_clear;
+    KeyedButton Command_add;
+    KeyedButton Command_change;
+    KeyedButton Command_clear;
 };
 
 MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
@@ -109,15 +118,12 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     Command_print = new QPushButton(w);
     Label4 = caption(w);
     Text1 = new QLineEdit(w);
-    Combo1 = new QComboBox(w);
-    Combo1->setEditable(true);
-    Combo2 = new QComboBox(w);
-    Combo2->setEditable(true);
-    Combo3 = new QComboBox(w);
-    Combo3->setEditable(true);
+    Combo1 = new EntryComboBox("Select type", w);
+    Combo2 = new EntryComboBox("Disc(s)", w);
+    Combo3 = new EntryComboBox("Info", w);
     Label3 = caption(w);
     Label3->setAlignment(Qt::AlignRight | Qt::AlignVCenter);
-    Textart = new QLineEdit(w);
+    Textart = new ShortLineEdit(4, w);
     Textart->setReadOnly(true);
     Textart->setFocusPolicy(Qt::NoFocus);
     Command_add = new QPushButton(w);
@@ -125,59 +131,95 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     Command_clear = new QPushButton(w);
     a_ = std::make_unique<Adapters>(*this);
     layOut();
+    // The first start opens at this size; the window grows from here.
+    window_->resize(QSize(700, 400).expandedTo(window_->sizeHint()));
+
+    nameField(List_list, "Current lists", Label1);
+    nameField(List1, "Titles", Label2);
+    nameField(Text1, "Title", Label4);
+    nameField(Combo1, "Type");
+    nameField(Combo2, "Discs");
+    nameField(Combo3, "Information");
+    nameField(Textart, "Article number", Label3);
+    auto* exit = new QShortcut(QKeySequence(Qt::CTRL | Qt::Key_Q), w);
+    QObject::connect(exit, &QShortcut::activated, Command_print, &QPushButton::click);
 
     QWidget* order[] = {
         Text1,          Combo1,         Combo2,         Combo3,           Command_add,
         Command_change, Command_clear,  Command_search, Command_delentry, Command_export,
         Command_print,  Command_create, Command_delete, List_list,        List1};
     for (std::size_t i = 1; i < std::size(order); ++i) QWidget::setTabOrder(order[i - 1], order[i]);
+    // The window opens with the focus where the tab order starts.
+    Text1->setFocus();
 }
 
 MainWindowView::~MainWindowView() = default;
 
 void MainWindowView::layOut() {
-    const int width = 700;
-    const int height = 400;
-    window_->setFixedSize(width, height);
+    // Left: the lists of lists with its two buttons. Middle: the dialog buttons, Exit at the
+    // bottom. Right: the titles, the tallest control. The lists take the room the window gains,
+    // the titles most.
+    auto* grid = new QGridLayout(window_.get());
+    grid->setContentsMargins(12, 8, 12, 12);
+    grid->setHorizontalSpacing(16);
+    grid->setVerticalSpacing(4);
+    grid->addWidget(Label1, 0, 0);
+    grid->addWidget(List_list, 1, 0);
+    auto* listButtons = new QHBoxLayout;
+    listButtons->addWidget(Command_create);
+    listButtons->addWidget(Command_delete);
+    grid->addLayout(listButtons, 2, 0);
+    auto* middle = new QVBoxLayout;
+    for (QPushButton* button : {Command_search, Command_delentry, Command_export}) {
+        middle->addWidget(button);
+    }
+    middle->addStretch();
+    middle->addWidget(Command_print);
+    grid->addLayout(middle, 1, 1);
+    grid->addWidget(Label2, 0, 2);
+    grid->addWidget(List1, 1, 2, 2, 1);
+    grid->setColumnStretch(0, 2);
+    grid->setColumnStretch(2, 3);
+    grid->setRowStretch(1, 1);
+    grid->setRowMinimumHeight(3, 10);
 
-    Label1->setGeometry(12, 10, 210, 18);
-    List_list->setGeometry(12, 30, 210, 212);
-    Command_create->setGeometry(12, 248, 103, 28);
-    Command_delete->setGeometry(119, 248, 103, 28);
+    // Across the bottom: the column header over the entry fields, then the article number and
+    // the entry buttons.
+    grid->addWidget(Label4, 4, 0, 1, 3);
+    grid->addLayout(fieldRow(), 5, 0, 1, 3);
+    auto* bottom = new QHBoxLayout;
+    bottom->addWidget(Label3);
+    bottom->addWidget(Textart);
+    bottom->addStretch();
+    for (QPushButton* button : {Command_add, Command_change, Command_clear}) {
+        bottom->addWidget(button);
+    }
+    grid->setRowMinimumHeight(6, 8);
+    grid->addLayout(bottom, 7, 0, 1, 3);
+}
 
-    const int mid = 238;
-    Command_search->setGeometry(mid, 30, 118, 28);
-    Command_delentry->setGeometry(mid, 64, 118, 28);
-    Command_export->setGeometry(mid, 98, 118, 28);
-    Command_print->setGeometry(mid, 214, 118, 28);
-
-    Label2->setGeometry(372, 10, 316, 18);
-    List1->setGeometry(372, 30, 316, 246);
-
-    // The column header is one text; each field starts under its word.
-    const QString header =
-        Label4->text().isEmpty() ? QString(main_window::kColumnHeader.c_str()) : Label4->text();
+// The column header is one text; each field starts under its word, as far as the field's own
+// text lets it: a field never gets narrower than its initial text needs.
+QHBoxLayout* MainWindowView::fieldRow() {
+    const QString header = QString::fromLatin1(main_window::kColumnHeader.c_str());
     const QFontMetrics metrics(Label4->font());
-    const int left = 12;
     auto column = [&](const char* word) {
-        return left + metrics.horizontalAdvance(header.left(header.indexOf(QLatin1String(word))));
+        return metrics.horizontalAdvance(header.left(header.indexOf(QLatin1String(word))));
     };
-    const int typeX = column("Type");
-    const int discsX = column("CD's");
-    const int infoX = column("Information");
-    Label4->setGeometry(left, 294, width - 2 * left, 18);
-    const int fieldsY = 314;
-    Text1->setGeometry(left, fieldsY, typeX - left - 6, 26);
-    Combo1->setGeometry(typeX, fieldsY, discsX - typeX - 6, 26);
-    Combo2->setGeometry(discsX, fieldsY, infoX - discsX - 6, 26);
-    Combo3->setGeometry(infoX, fieldsY, width - left - infoX, 26);
-
-    const int rowY = 354;
-    Label3->setGeometry(left, rowY, 44, 26);
-    Textart->setGeometry(left + 50, rowY, 60, 26);
-    Command_add->setGeometry(width - left - 3 * 96 - 12, rowY, 96, 28);
-    Command_change->setGeometry(width - left - 2 * 96 - 6, rowY, 96, 28);
-    Command_clear->setGeometry(width - left - 96, rowY, 96, 28);
+    const int spacing = 6;
+    const int starts[] = {0, column("Type"), column("CD's"), column("Information")};
+    QWidget* fields[] = {Text1, Combo1, Combo2};
+    auto* row = new QHBoxLayout;
+    row->setSpacing(spacing);
+    int x = 0;
+    for (int i = 0; i < 3; ++i) {
+        const int width = std::max(starts[i + 1] - x - spacing, fields[i]->sizeHint().width());
+        fields[i]->setFixedWidth(width);
+        row->addWidget(fields[i]);
+        x += width + spacing;
+    }
+    row->addWidget(Combo3, 1);
+    return row;
 }
 
 main_window::Form1Controls MainWindowView::controls() {

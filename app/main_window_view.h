@@ -7,6 +7,7 @@
 #include "ui/qt/qt_controls.h"
 
 class QComboBox;
+class QHBoxLayout;
 class QLabel;
 class QLineEdit;
 class QListWidget;
@@ -46,6 +47,7 @@ class MainWindowView {
 
   private:
     void layOut();
+    QHBoxLayout* fieldRow();
 
     std::unique_ptr<QWidget> window_;
     struct Adapters;

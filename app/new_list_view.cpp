@@ -1,5 +1,6 @@
 #include "app/new_list_view.h"
 
+#include <QBoxLayout>
 #include <QCheckBox>
 #include <QFrame>
 #include <QLabel>
@@ -7,6 +8,7 @@
 #include <QPushButton>
 
 #include "app/dialog_window.h"
+#include "app/widgets.h"
 #include "ui/qt/qt_controls.h"
 
 namespace app {
@@ -16,39 +18,55 @@ struct NewListView::Adapters {
         : window(v.widget()),
           Label1(v.Label1),
           Text1(v.Text1),
-          Check_info(v.Check_info),
-          Command1(v.Command1),
-          Command2(v.Command2) {}
+          Check_info(v.Check_info, "Include &information column"),
+          Command1(v.Command1, "C&reate"),
+          Command2(v.Command2, "&Cancel") {}
 
     DialogWindow window;
     ui::qt::QtLabel Label1;
     ui::qt::QtTextBox Text1;
-    ui::qt::QtCheckBox Check_info;
-    ui::qt::QtButton Command1;
-    ui::qt::QtButton Command2;
+    WithAccessKey<ui::qt::QtCheckBox, QCheckBox> Check_info;
+    WithAccessKey<ui::qt::QtButton, QPushButton> Command1;
+    WithAccessKey<ui::qt::QtButton, QPushButton> Command2;
 };
 
 NewListView::NewListView(QWidget* owner) : window_(std::make_unique<QWidget>()) {
     QWidget* w = window_.get();
-    makeDialogWindow(w, owner, QSize(360, 164));
+    makeDialogWindow(w, owner);
 
     Frame1 = new QFrame(w);
     Frame1->setFrameShape(QFrame::StyledPanel);
-    Frame1->setGeometry(6, 6, 348, 152);
     Label1 = new QLabel(Frame1);
     Label1->setAlignment(Qt::AlignCenter);
-    Label1->setGeometry(10, 10, 328, 20);
     Text1 = new QLineEdit(Frame1);
-    Text1->setGeometry(10, 36, 328, 26);
+    Text1->setMinimumWidth(300);
     Check_info = new QCheckBox(Frame1);
-    Check_info->setGeometry(10, 72, 260, 22);
     Image1 = discPicture(Frame1);
-    Image1->move(306, 68);
-    // "Create" on the left, the pair centred under the name box.
     Command1 = new QPushButton(Frame1);
-    Command1->setGeometry(50, 110, 120, 30);
     Command2 = new QPushButton(Frame1);
-    Command2->setGeometry(178, 110, 120, 30);
+
+    // The prompt over the name box, the option beside the picture, then "Create" and "Cancel"
+    // centred. The dialog keeps the size its contents need.
+    auto* inner = new QVBoxLayout(Frame1);
+    inner->addWidget(Label1);
+    inner->addWidget(Text1);
+    auto* option = new QHBoxLayout;
+    option->addWidget(Check_info);
+    option->addStretch();
+    option->addWidget(Image1);
+    inner->addLayout(option);
+    auto* buttons = new QHBoxLayout;
+    buttons->addStretch();
+    buttons->addWidget(Command1);
+    buttons->addWidget(Command2);
+    buttons->addStretch();
+    inner->addLayout(buttons);
+    auto* outer = new QVBoxLayout(w);
+    outer->setContentsMargins(6, 6, 6, 6);
+    outer->addWidget(Frame1);
+    outer->setSizeConstraint(QLayout::SetFixedSize);
+    for (QPushButton* button : {Command1, Command2}) button->setMinimumWidth(120);
+    nameField(Text1, "Name of the new list", Label1);
 
     QWidget::setTabOrder(Text1, Command1);
     QWidget::setTabOrder(Command1, Command2);

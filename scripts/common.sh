@@ -1,10 +1,14 @@
-# Shared by the project's scripts: installs the Debian packages the build needs, once.
-PEMLA_PACKAGES=(g++ cmake ninja-build qt6-base-dev libgl-dev libgtest-dev libgmock-dev
-    libbenchmark-dev clang libclang-rt-14-dev xvfb xauth xdotool imagemagick fonts-dejavu-core)
+# Shared by the project's scripts: installs the Debian packages they need, once.
+# What building and running the program needs:
+PEMLA_BUILD_PACKAGES=(g++ cmake ninja-build qt6-base-dev qt6-svg-dev libgl-dev fonts-dejavu-core)
+# What the tests, fuzzing, benchmarks and screenshots need on top:
+PEMLA_TEST_PACKAGES=(libgtest-dev libgmock-dev libbenchmark-dev clang libclang-rt-14-dev
+    clang-format xvfb xauth xdotool imagemagick appstream desktop-file-utils)
 
-pemla_install_missing() {
+# Installs what is missing of the named packages (as root, or via sudo).
+pemla_install() {
     local missing=()
-    for package in "${PEMLA_PACKAGES[@]}"; do
+    for package in "$@"; do
         dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q "ok installed" ||
             missing+=("$package")
     done
@@ -15,4 +19,9 @@ pemla_install_missing() {
     "${sudo[@]}" apt-get update -qq
     DEBIAN_FRONTEND=noninteractive "${sudo[@]}" apt-get install -y -qq --no-install-recommends \
         "${missing[@]}" >/dev/null
+}
+
+# Everything, for the test, fuzz, benchmark and screenshot commands.
+pemla_install_missing() {
+    pemla_install "${PEMLA_BUILD_PACKAGES[@]}" "${PEMLA_TEST_PACKAGES[@]}"
 }

@@ -8,7 +8,7 @@ source "$root/scripts/common.sh"
 pemla_install_missing
 seconds="${1:-300}"
 
-CXX=clang++ cmake -S "$root" -B "$root/build-fuzz" -G Ninja -DPEMLA_FUZZ=ON \
+CXX=clang++ cmake -S "$root" -B "$root/build-fuzz" -G Ninja -DPEMLA_FUZZ=ON -DPEMLA_WERROR=ON \
     -DCMAKE_BUILD_TYPE=RelWithDebInfo >/dev/null
 cmake --build "$root/build-fuzz" -j "$(nproc)" >/dev/null
 

@@ -1,7 +1,8 @@
 #!/usr/bin/env bash
 # Builds the program, starts it under Xvfb on a sample catalogue and saves PNGs of the main window
 # (a list open, an entry selected; once for a list with and once for one without the information
-# column) and of each dialog (new list, search with a result, export).
+# column; once filling the screen) and of each dialog (new list, search with a result, export),
+# at the normal size, with 14-point fonts and at twice the scale.
 #   scripts/screenshot.sh [output folder]     (default /tmp/pemla-shots)
 set -euo pipefail
 root="$(cd "$(dirname "$0")/.." && pwd)"
@@ -9,7 +10,9 @@ out="$(mkdir -p "${1:-/tmp/pemla-shots}" && cd "${1:-/tmp/pemla-shots}" && pwd)"
 
 # Second stage: runs inside xvfb-run with the sample catalogue ready.
 if [ "${PEMLA_SHOTS_STAGE:-}" = "display" ]; then
-    PEMLA_DATA="$PEMLA_SHOTS_DATA" "$root/build-release/app/pemla-launcher" &
+    variant="${PEMLA_SHOTS_VARIANT:-}"
+    PEMLA_DATA="$PEMLA_SHOTS_DATA" XDG_CONFIG_HOME="$PEMLA_SHOTS_DATA/config" \
+        "$root/build-release/app/pemla" &
     program=$!
     trap 'kill "$program" 2>/dev/null || true' EXIT
 
@@ -18,17 +21,12 @@ if [ "${PEMLA_SHOTS_STAGE:-}" = "display" ]; then
         local id
         id=$(timeout 20 xdotool search --sync --onlyvisible --name "^$1\$" | head -n 1) || true
         if [ -z "$id" ]; then
-            echo "screenshot.sh: the window \"$1\" did not appear" >&2
+            echo "screenshot.sh: the window \"$1\" did not appear; the screen is in" \
+                "$out/failed-screen.png" >&2
+            import -window root "$out/failed-screen.png"
             return 1
         fi
         echo "$id"
-    }
-    # Clicks at x, y inside a window (its top-left corner is 0, 0).
-    click() {
-        local X Y
-        eval "$(xdotool getwindowgeometry --shell "$1" | grep -E '^(X|Y)=')"
-        xdotool mousemove "$((X + $2))" "$((Y + $3))" click 1
-        sleep 0.4
     }
     # Types into the window that has the focus.
     typeText() {
@@ -44,42 +42,46 @@ if [ "${PEMLA_SHOTS_STAGE:-}" = "display" ]; then
 
     main=$(window "Pemla 0.90Beta")
     sleep 1
-
-    # The lists are sorted: Films, Jeux vidéo, Musique. Open Films, pick "Les Misérables".
-    click "$main" 60 40
-    click "$main" 430 40
     xdotool windowfocus --sync "$main"
-    xdotool key Down Down Down Down
-    shot "$main" main-window
+    keys() { xdotool key --delay 80 "$@"; sleep 0.4; }
+
+    # The lists are sorted: Films, Jeux vidéo, Musique. The focus starts in the title box; a
+    # list box starts with its first row current but not selected. Open Films (two back from the
+    # title box), pick "Les Misérables" in the titles.
+    keys shift+Tab shift+Tab Down Up
+    keys Tab Down Down Down Down
+    shot "$main" "${variant}main-window"
 
     # The list without an information column, with its longest title selected.
-    click "$main" 60 58
-    click "$main" 430 40
-    xdotool windowfocus --sync "$main"
-    xdotool key Down
-    shot "$main" main-window-no-information
+    keys shift+Tab Down Tab Down
+    shot "$main" "${variant}main-window-no-information"
 
-    # Back to Films for the dialogs.
-    click "$main" 60 40
+    # The same window filling the screen.
+    xdotool windowsize --sync "$main" 100% 100%
+    shot "$main" "${variant}main-window-maximised"
 
-    click "$main" 62 262  # Create new list
+    # Back to Films for the dialogs, opened and closed by their access keys.
+    keys shift+Tab Up
+    keys alt+n
     dialog=$(window "Create new list")
     typeText "$dialog" "Séries télé"
-    shot "$dialog" new-list
-    click "$dialog" 244 131  # Cancel
+    shot "$dialog" "${variant}new-list"
+    keys alt+c
 
-    click "$main" 297 44  # Search Art#
+    xdotool windowfocus --sync "$main"
+    keys alt+s
     dialog=$(window "Search article number")
     typeText "$dialog" "a001"
-    click "$dialog" 61 30  # Search
-    shot "$dialog" search
-    click "$dialog" 61 66  # Cancel
+    keys alt+s
+    shot "$dialog" "${variant}search"
+    keys alt+c
 
-    click "$main" 297 112  # Export pemla
+    xdotool windowfocus --sync "$main"
+    keys alt+e
     dialog=$(window "Export list")
     sleep 1  # the folder list reads its folders in the background
-    shot "$dialog" export
-    click "$dialog" 322 62  # Cancel
+    shot "$dialog" "${variant}export"
+    keys alt+c
     exit 0
 fi
 
@@ -142,7 +144,11 @@ list "Jeux vidéo" 0 \
     "Tetris" "Game" 1 "  " T002
 put "Jeux vidéo.arn" "A#001" "!#002" "T#003"
 put export.dat "$data/reports" " 1 " " 0 " " 1 " " 0 " " 1 " " 1 " "10" "Top"
-# The launcher copies the supplied suggestion files into the data folder.
+# The program puts the supplied suggestion files into the data folder itself.
 
-PEMLA_SHOTS_STAGE=display PEMLA_SHOTS_DATA="$data" \
-    xvfb-run -a -s "-screen 0 1024x768x24" "$0" "$out"
+# Once as it comes, once with fonts of 14 points (the program's 9 points at 149 dpi), once at
+# twice the scale.
+export PEMLA_SHOTS_STAGE=display PEMLA_SHOTS_DATA="$data"
+xvfb-run -a -s "-screen 0 1600x1000x24" "$0" "$out"
+PEMLA_SHOTS_VARIANT=font14- QT_FONT_DPI=149 xvfb-run -a -s "-screen 0 1600x1000x24" "$0" "$out"
+PEMLA_SHOTS_VARIANT=scale2- QT_SCALE_FACTOR=2 xvfb-run -a -s "-screen 0 1600x1000x24" "$0" "$out"

@@ -19,10 +19,12 @@ build() {  # folder, extra cmake options...
     cmake --build "$root/$folder" -j "$jobs"
 }
 
-build build-test -DCMAKE_BUILD_TYPE=RelWithDebInfo
-build build-asan -DCMAKE_BUILD_TYPE=Debug -DPEMLA_SANITIZE=ON
+build build-test -DCMAKE_BUILD_TYPE=RelWithDebInfo -DPEMLA_WERROR=ON
+build build-asan -DCMAKE_BUILD_TYPE=Debug -DPEMLA_SANITIZE=ON -DPEMLA_WERROR=ON
 
 status=0
+echo "== Format =="
+(cd "$root" && git ls-files -- '*.cpp' '*.h' | xargs clang-format --dry-run --Werror) || status=1
 echo "== Fuzz targets (a few seconds each) =="
 "$root/scripts/fuzz.sh" "${PEMLA_FUZZ_SECONDS:-5}" || status=1
 echo "== Tests (sanitizers) =="

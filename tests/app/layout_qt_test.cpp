@@ -1,0 +1,148 @@
+// The program's four windows on Qt as a user with a large window, large fonts, a keyboard or a
+// screen reader meets them.
+#include <gtest/gtest.h>
+
+#include <QAbstractButton>
+#include <QAbstractScrollArea>
+#include <QAccessible>
+#include <QApplication>
+#include <QComboBox>
+#include <QIcon>
+#include <QImage>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QTest>
+
+#include "app/program.h"
+#include "app/start_up.h"
+#include "tests/support/temp_folder.h"
+
+namespace {
+
+struct Windows {
+    Windows() : program(folder(), platform) {
+        program.start();
+        const auto music = program.mainWindow().List_list->findItems("Music", Qt::MatchExactly);
+        program.mainWindow().List_list->setCurrentItem(music.front());  // opens the list
+    }
+    static const std::string& folder() {
+        static test_support::TempFolder files;
+        files.put("type.dat", "Types\r\nAn uncommonly long type of disc, longer than any box\r\n");
+        files.put("information.dat", "Information\r\nOriginal\r\n");
+        files.put("pemla.dat", "Music\r\n");
+        files.put("Music.dat", "<|?Zebra\r\n<|'CD\r\n<||1\r\n<|*Original\r\n");
+        files.put("Music.art", "Zebra#*\\Z001\r\n");
+        files.put("Music.arn", "Z#002\r\n");
+        files.put("Music.inf", " 1 \r\n");
+        return files.path();
+    }
+    // Every window, each shown (and so loaded, with its captions).
+    std::vector<QWidget*> all() {
+        program.newListDialog().controls().window.show();
+        program.searchDialog().controls().window.show();
+        program.exportDialog().controls().window.show();
+        return {program.mainWindow().widget(), program.newListDialog().widget(),
+                program.searchDialog().widget(), program.exportDialog().widget()};
+    }
+
+    ui::qt::QtPlatform platform;
+    app::Program program;
+};
+
+// The visible controls of a window, without the parts that list and combo boxes are made of.
+std::vector<QWidget*> controlsOf(QWidget* window) {
+    std::vector<QWidget*> controls;
+    for (QWidget* w : window->findChildren<QWidget*>()) {
+        bool part = false;
+        for (QWidget* up = w->parentWidget(); up != window; up = up->parentWidget()) {
+            part = part || up->inherits("QAbstractScrollArea") || up->inherits("QComboBox");
+        }
+        if (!part && w->isVisibleTo(window)) controls.push_back(w);
+    }
+    return controls;
+}
+
+TEST(Windows, TheMainWindowGrowsAndItsListsTakeTheRoom) {
+    Windows w;
+    app::MainWindowView& view = w.program.mainWindow();
+    const int lists = view.List_list->width(), titles = view.List1->width();
+    view.widget()->resize(1200, 800);
+    QApplication::processEvents();
+    EXPECT_GT(view.List_list->width(), lists);
+    EXPECT_GT(view.List1->width() - titles, view.List_list->width() - lists);
+    EXPECT_GT(view.List1->height(), 500);
+    const std::vector<QWidget*> controls = controlsOf(view.widget());
+    for (QWidget* a : controls) {
+        for (QWidget* b : controls) {
+            EXPECT_TRUE(a == b || a->isAncestorOf(b) || b->isAncestorOf(a) ||
+                        !a->geometry().intersects(b->geometry()))
+                << a->objectName().toStdString() << a->metaObject()->className() << " and "
+                << b->metaObject()->className();
+        }
+    }
+
+    // It carries the program's picture, drawn from the built-in file.
+    const QImage icon = app::programIcon().pixmap(32).toImage();
+    EXPECT_GT(qAlpha(icon.pixel(16, 16)), 0);
+
+    // Its size and place are kept for the next start.
+    test_support::TempFolder config;
+    app::saveWindowPlace(view.widget(), config.file("pemla/window"));
+    Windows next;
+    app::restoreWindowPlace(next.program.mainWindow().widget(), config.file("pemla/window"));
+    EXPECT_EQ(next.program.mainWindow().widget()->size(), QSize(1200, 800));
+}
+
+TEST(Windows, EveryControlHasANameAndEveryButtonAnAccessKey) {
+    Windows w;
+    for (QWidget* window : w.all()) {
+        std::set<int> keys;
+        for (QWidget* control : controlsOf(window)) {
+            const bool interactive =
+                control->inherits("QAbstractButton") || control->inherits("QLineEdit") ||
+                control->inherits("QComboBox") || control->inherits("QAbstractItemView");
+            if (!interactive) continue;
+            // Buttons are named by their captions; a combo box would otherwise be named by its
+            // current text, so the others need a name of their own.
+            auto* button = qobject_cast<QAbstractButton*>(control);
+            const QString name =
+                button ? QAccessible::queryAccessibleInterface(control)->text(QAccessible::Name)
+                       : control->accessibleName();
+            EXPECT_FALSE(name.trimmed().isEmpty()) << control->metaObject()->className();
+            if (button != nullptr) {
+                const int key = QKeySequence::mnemonic(button->text())[0].toCombined();
+                EXPECT_NE(key, 0) << name.toStdString();
+                EXPECT_TRUE(keys.insert(key).second) << "a second " << name.toStdString();
+            }
+        }
+    }
+    // Ctrl+Q does what Exit does (while no dialog has the main window disabled).
+    Windows fresh;
+    QApplication::setActiveWindow(fresh.program.mainWindow().widget());
+    QTest::keyClick(fresh.program.mainWindow().widget(), Qt::Key_Q, Qt::ControlModifier);
+    EXPECT_TRUE(fresh.platform.ended());
+    ui::qt::QtWindow::setEnding(false);
+}
+
+TEST(Windows, At14PointsNoControlIsSmallerThanItNeeds) {
+    const QFont normal = QApplication::font();
+    QApplication::setFont(QFont(QStringLiteral("DejaVu Sans"), 14));
+    {
+        Windows w;
+        for (QWidget* window : w.all()) {
+            QApplication::processEvents();
+            for (QWidget* control : controlsOf(window)) {
+                if (control->inherits("QAbstractScrollArea")) continue;  // they scroll
+                const QSize hint = control->sizeHint();
+                EXPECT_TRUE(!hint.isValid() || (control->width() >= hint.width() &&
+                                                control->height() >= hint.height()))
+                    << control->metaObject()->className() << " in "
+                    << window->windowTitle().toStdString() << ": " << control->width() << "x"
+                    << control->height() << " < " << hint.width() << "x" << hint.height();
+            }
+        }
+    }
+    QApplication::setFont(normal);
+}
+
+}  // namespace
