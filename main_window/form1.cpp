@@ -75,7 +75,7 @@ void Form1::Form_Load() {
                                  "\". Use the window that is open there: a second copy could "
                                  "undo its changes, so this one ends without changing anything.",
                              16, "Error");
-        platform_.endProgram(2);
+        platform_.endProgram(3);
         return;
     }
     try {

@@ -63,7 +63,7 @@ class Form1 {
     // Start-up: locks the folder, finishes an interrupted save, fills the suggestion boxes and
     // the lists. On a failure it says which file cannot be used in which folder and ends the
     // program with status 1; when another copy holds the folder it says so, naming the folder,
-    // and ends with status 2. Either way nothing is written.
+    // and ends with status 3. Either way nothing is written.
     void Form_Load();
     // Closing the window unloads the export dialog, then the new-list dialog (and the search).
     void Form_Unload();

@@ -113,7 +113,7 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
 }
 
 // The real program started a second time on the folder this window holds ends with its message
-// and status 2, writing nothing; this window then writes as before. The second copy runs on a
+// and status 3, writing nothing; this window then writes as before. The second copy runs on a
 // display of its own, where xdotool answers its "Error" box; `timeout` fails the test instead of
 // waiting for ever on a copy that opened its main window.
 TEST(MainWindowOnQt, ASecondRealCopyOnTheSameFolderEndsAndTheFirstStillWrites) {
@@ -126,15 +126,15 @@ TEST(MainWindowOnQt, ASecondRealCopyOnTheSameFolderEndsAndTheFirstStillWrites) {
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
     environment.remove(QStringLiteral("QT_QPA_PLATFORM"));
     second.setProcessEnvironment(environment);
-    second.setWorkingDirectory(QString::fromStdString(folder.path()));
     second.start(QStringLiteral("timeout"),
                  {"60", "xvfb-run", "-a", "sh", "-c",
-                  "\"$0\" & id=$(timeout 30 xdotool search --sync --onlyvisible --name '^Error$' "
+                  "\"$0\" --data \"$1\" & id=$(timeout 30 xdotool search --sync --onlyvisible "
+                  "--name '^Error$' "
                   "| head -n 1) && xdotool windowfocus --sync \"$id\" key Return; wait $!",
-                  PEMLA_BINARY});
+                  PEMLA_BINARY, QString::fromStdString(folder.path())});
     ASSERT_TRUE(second.waitForFinished(90000)) << "the second copy did not end";
     EXPECT_EQ(second.exitStatus(), QProcess::NormalExit);
-    EXPECT_EQ(second.exitCode(), 2) << second.readAllStandardError().toStdString();
+    EXPECT_EQ(second.exitCode(), 3) << second.readAllStandardError().toStdString();
     EXPECT_EQ(folder.listing() + folder.get("Music.dat") + folder.get("pemla.dat"), before);
 
     w.select(w.view.List_list, QStringLiteral("Music"));
