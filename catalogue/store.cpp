@@ -148,13 +148,17 @@ void refuseProtected(const std::string& fullPath, const std::string& shown) {
 
 // A target that the rename or unlink after the commit point would fail on (a folder, a name the
 // system refuses) could never be finished by any recovery: it is refused while nothing changed.
-void refuseUnreplaceable(const std::string& fullPath, const std::string& shown) {
+void refuseUnreplaceable(const std::string& fullPath, const std::string& shown, bool replacing) {
     struct stat st {};
     if (::lstat(fullPath.c_str(), &st) != 0) {
         if (errno != ENOENT) throw osError(shown, errno);
         return;
     }
     if (S_ISDIR(st.st_mode)) throw osError(shown, EISDIR);
+    // Nor is a FIFO or a device that the user put in a file's place replaced by a file.
+    if (replacing && !S_ISREG(st.st_mode) && !S_ISLNK(st.st_mode)) {
+        throw CatalogueError(shown, "it is a FIFO or a device, not a file");
+    }
 }
 
 }  // namespace
@@ -386,7 +390,7 @@ void Transaction::commit() {
     }
     for (const Action& action : plan) {
         refuseProtected(s.path(action.name), action.name);
-        refuseUnreplaceable(s.path(action.name), action.name);
+        refuseUnreplaceable(s.path(action.name), action.name, action.isWrite);
     }
 
     JournalPlan journal;

@@ -71,6 +71,14 @@ const Damage kDamages[] = {
     {"AFolderForTheFlagFile", "Rock.inf", "[folder]", true},
     {"AFifoForTheEntryFile", "Rock.dat", "[fifo]", true},
     {"AFifoForTheCounterFile", "Rock.arn", "[fifo]", true},
+    // The dialog opens on its defaults; the closing's save names the file and leaves it.
+    {"AFifoForTheExportSettings", "export.dat", "[fifo]", true,
+     [](Rig& r) {
+         r.platform.answer(Answer::Ok);
+         r.open("Rock");
+         r.view.Command_export.click();
+         r.exportView.window.userClose();
+     }},
     {"ADanglingLinkForTheEntryFile", "Rock.dat", "[link to no-such-file]", true},
     {"ADanglingLinkForTheArticleFile", "Rock.art", "[link to no-such-file]", true},
     {"AddingWhereTheArticleFileIsALinkToAFolder", "Rock.art", "[link to elsewhere]", true},
