@@ -2,6 +2,7 @@
 #include <iostream>
 
 #include "app/command_line.h"
+#include "app/command_tasks.h"
 #include "app/data_folder.h"
 #include "app/program.h"
 #include "app/start_up.h"
@@ -11,7 +12,7 @@
 // The start-up, step by step: the command line and the data folder need no display; the
 // windows come last.
 int main(int argc, char* argv[]) {
-    const app::CommandLine commandLine = app::parseCommandLine(argc, argv);
+    app::CommandLine commandLine = app::parseCommandLine(argc, argv);
     switch (commandLine.action) {
         case app::CommandLine::Action::Help:
         case app::CommandLine::Action::Version:
@@ -20,6 +21,19 @@ int main(int argc, char* argv[]) {
         case app::CommandLine::Action::Error:
             std::cerr << commandLine.output << std::flush;
             return 2;
+        case app::CommandLine::Action::Export:
+        case app::CommandLine::Action::Import:
+            app::resolveCommandFiles(commandLine);
+            try {
+                const std::string folder =
+                    app::openDataFolder(commandLine, app::processEnvironment());
+                return commandLine.action == app::CommandLine::Action::Export
+                           ? app::exportCommand(commandLine, folder, std::cout, std::cerr)
+                           : app::importCommand(commandLine, folder, std::cout, std::cerr);
+            } catch (const catalogue::CatalogueError& e) {
+                std::cerr << "pemla: " << e.reason() << std::endl;
+                return 1;
+            }
         case app::CommandLine::Action::Run:
             break;
     }

@@ -129,6 +129,11 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     Command_add = new QPushButton(w);
     Command_change = new QPushButton(w);
     Command_clear = new QPushButton(w);
+    Label_find = caption(w);
+    Label_find->setText(QStringLiteral("&Find title:"));
+    Text_find = new QLineEdit(w);
+    Text_find->setValidator(new ui::qt::StorableTextValidator(Text_find));
+    Text_find->setClearButtonEnabled(true);
     a_ = std::make_unique<Adapters>(*this);
     layOut();
     // The first start opens at this size; the window grows from here.
@@ -141,13 +146,15 @@ MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     nameField(Combo2, "Discs");
     nameField(Combo3, "Information");
     nameField(Textart, "Article number", Label3);
+    nameField(Text_find, "Find title", Label_find);
     auto* exit = new QShortcut(QKeySequence(Qt::CTRL | Qt::Key_Q), w);
     QObject::connect(exit, &QShortcut::activated, Command_print, &QPushButton::click);
 
     QWidget* order[] = {
         Text1,          Combo1,         Combo2,         Combo3,           Command_add,
         Command_change, Command_clear,  Command_search, Command_delentry, Command_export,
-        Command_print,  Command_create, Command_delete, List_list,        List1};
+        Command_print,  Command_create, Command_delete, List_list,        Text_find,
+        List1};
     for (std::size_t i = 1; i < std::size(order); ++i) QWidget::setTabOrder(order[i - 1], order[i]);
     // The window opens with the focus where the tab order starts.
     Text1->setFocus();
@@ -177,7 +184,15 @@ void MainWindowView::layOut() {
     middle->addWidget(Command_print);
     grid->addLayout(middle, 1, 1);
     grid->addWidget(Label2, 0, 2);
-    grid->addWidget(List1, 1, 2, 2, 1);
+    // The find box sits right above the titles it searches.
+    auto* titles = new QVBoxLayout;
+    auto* find = new QHBoxLayout;
+    find->setSpacing(6);
+    find->addWidget(Label_find);
+    find->addWidget(Text_find, 1);
+    titles->addLayout(find);
+    titles->addWidget(List1, 1);
+    grid->addLayout(titles, 1, 2, 2, 1);
     grid->setColumnStretch(0, 2);
     grid->setColumnStretch(2, 3);
     grid->setRowStretch(1, 1);
@@ -220,6 +235,17 @@ QHBoxLayout* MainWindowView::fieldRow() {
     }
     row->addWidget(Combo3, 1);
     return row;
+}
+
+void MainWindowView::connectFinder(main_window::TitleFinder& finder) {
+    QObject::connect(Text_find, &QLineEdit::textEdited, [&finder](const QString& text) {
+        finder.Text_find_Change(ui::qt::fromQt(text));
+    });
+    QObject::connect(Text_find, &QLineEdit::returnPressed, [&finder] { finder.FindNext(); });
+    auto* next = new QShortcut(QKeySequence(Qt::Key_F3), window_.get());
+    QObject::connect(next, &QShortcut::activated, [&finder] { finder.FindNext(); });
+    auto* previous = new QShortcut(QKeySequence(Qt::SHIFT | Qt::Key_F3), window_.get());
+    QObject::connect(previous, &QShortcut::activated, [&finder] { finder.FindPrevious(); });
 }
 
 main_window::Form1Controls MainWindowView::controls() {

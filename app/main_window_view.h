@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "main_window/form1.h"
+#include "main_window/title_finder.h"
 #include "ui/qt/qt_controls.h"
 
 class QComboBox;
@@ -22,6 +23,9 @@ class MainWindowView {
     ~MainWindowView();
 
     main_window::Form1Controls controls();
+    // Wires the "Find title" box: typing finds, Enter and F3 go to the next match, Shift+F3 to
+    // the previous one (F3 anywhere in the window).
+    void connectFinder(main_window::TitleFinder& finder);
     QWidget* widget() const { return window_.get(); }
 
     QListWidget* List_list;
@@ -44,6 +48,8 @@ class MainWindowView {
     QPushButton* Command_add;
     QPushButton* Command_change;
     QPushButton* Command_clear;
+    QLabel* Label_find;
+    QLineEdit* Text_find;
 
   private:
     void layOut();

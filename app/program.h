@@ -44,6 +44,7 @@ class Program {
     ui::qt::QtPlatform& platform_;
     MainWindowView mainView_;
     main_window::Form1 form1_;
+    main_window::TitleFinder finder_;
     NewListView newListView_;
     new_list::Form_new_list formNewList_;
     SearchView searchView_;

@@ -6,6 +6,8 @@
 #include <cerrno>
 #include <string>
 
+#include "catalogue/file_names.h"
+
 namespace catalogue {
 
 bool isPortableName(std::string_view name) {
@@ -20,7 +22,7 @@ bool isPortableName(std::string_view name) {
 
 bool probeFileName(Store& store, std::string_view name) {
     if (!isPortableName(name)) return false;
-    const std::string probeName = std::string(name) + std::string(kProbeSuffix);
+    const std::string probeName = fileSystemName(name) + std::string(kProbeSuffix);
     const std::string probe = store.path(probeName);
     // A file of that name that the user already has is left as it is, and its presence is
     // itself proof that the name is accepted. It is never recorded, so no start removes it.

@@ -1,5 +1,6 @@
 #include "catalogue/records.h"
 
+#include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 
@@ -37,16 +38,16 @@ std::size_t entryEnd(std::string_view text, std::size_t at) {
 }  // namespace
 
 std::string entryFile(std::string_view list) {
-    return std::string(list) + ".dat";
+    return fileSystemName(list) + ".dat";
 }
 std::string articleFile(std::string_view list) {
-    return std::string(list) + ".art";
+    return fileSystemName(list) + ".art";
 }
 std::string counterFile(std::string_view list) {
-    return std::string(list) + ".arn";
+    return fileSystemName(list) + ".arn";
 }
 std::string flagFile(std::string_view list) {
-    return std::string(list) + ".inf";
+    return fileSystemName(list) + ".inf";
 }
 
 std::optional<std::vector<std::string>> entryTitles(std::string_view bytes) {

@@ -34,7 +34,7 @@ inline constexpr std::string_view kSkeletonEntries =
 inline constexpr std::string_view kSkeletonArticles = "Add an item and delete me!#*\\A001\r\n";
 inline constexpr std::string_view kSkeletonCounter = "A#001\r\n";
 
-// File names of a list's files.
+// File names of a list's files: the list name in the file system's encoding plus the ending.
 std::string entryFile(std::string_view list);
 std::string articleFile(std::string_view list);
 std::string counterFile(std::string_view list);

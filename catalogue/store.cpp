@@ -362,11 +362,16 @@ void Transaction::expect(const std::string& name, const FileStamp& stamp) {
 }
 
 void Transaction::write(const std::string& name, std::string_view text) {
-    actions_.push_back({name, true, forWriting(text)});
+    actions_.push_back({name, Kind::Write, forWriting(text)});
 }
 
 void Transaction::remove(const std::string& name) {
-    actions_.push_back({name, false, {}});
+    actions_.push_back({name, Kind::Remove, {}});
+}
+
+void Transaction::rename(const std::string& from, const std::string& to) {
+    store_.path(from);  // refuses a name outside the folder now rather than at the commit
+    actions_.push_back({to, Kind::Rename, from});
 }
 
 void Transaction::commit() {
@@ -390,33 +395,37 @@ void Transaction::commit() {
     }
     for (const Action& action : plan) {
         refuseProtected(s.path(action.name), action.name);
-        refuseUnreplaceable(s.path(action.name), action.name, action.isWrite);
+        refuseUnreplaceable(s.path(action.name), action.name, action.kind != Kind::Remove);
     }
 
     JournalPlan journal;
+    std::vector<std::string> staged;  // only these may be removed when the commit is given up
     try {
         for (const Action& action : plan) {
-            if (action.isWrite) {
-                const std::string staged = s.tempName(action.name);
-                journal.renames.emplace_back(staged, action.name);
+            if (action.kind == Kind::Rename) {
+                journal.renames.emplace_back(action.bytes, action.name);
+            } else if (action.kind == Kind::Write) {
+                staged.push_back(s.tempName(action.name));
+                journal.renames.emplace_back(staged.back(), action.name);
                 const std::optional<mode_t> mode = modeOf(s.path(action.name));
-                s.writeDurable(s.path(staged), action.name, action.bytes, mode ? &*mode : nullptr);
+                s.writeDurable(s.path(staged.back()), action.name, action.bytes,
+                               mode ? &*mode : nullptr);
             } else {
                 journal.deletions.push_back(action.name);
             }
         }
     } catch (...) {
-        for (const auto& staged : journal.renames) s.sys_.unlink(s.path(staged.first));
+        for (const auto& name : staged) s.sys_.unlink(s.path(name));
         throw;
     }
 
-    if (plan.size() == 1) {
+    if (plan.size() == 1 && plan.front().kind != Kind::Rename) {
         // One file: a rename or an unlink is atomic by itself.
-        if (plan.front().isWrite) {
-            const auto& [staged, target] = journal.renames.front();
-            if (s.sys_.rename(s.path(staged), s.path(target)) != 0) {
+        if (plan.front().kind == Kind::Write) {
+            const auto& [temp, target] = journal.renames.front();
+            if (s.sys_.rename(s.path(temp), s.path(target)) != 0) {
                 const int err = errno;
-                s.sys_.unlink(s.path(staged));
+                s.sys_.unlink(s.path(temp));
                 throw osError(target, err);
             }
         } else if (s.sys_.unlink(s.path(plan.front().name)) != 0 && errno != ENOENT) {
@@ -433,7 +442,7 @@ void Transaction::commit() {
     }
 
     auto discard = [&] {
-        for (const auto& staged : journal.renames) s.sys_.unlink(s.path(staged.first));
+        for (const auto& name : staged) s.sys_.unlink(s.path(name));
         s.sys_.unlink(s.path(kJournalTemp));
     };
     const std::string journalName(kJournalName);

@@ -66,6 +66,8 @@ class Transaction {
     void write(const std::string& name, std::string_view text);
     // Plans `name` to be deleted; a file that does not exist is no error.
     void remove(const std::string& name);
+    // Plans the file `from` to be renamed to `to`, its bytes untouched.
+    void rename(const std::string& from, const std::string& to);
     // Carries out every planned change, all or nothing. A later plan for the same name replaces
     // an earlier one. Finishes a pending journal first (throws naming it when it cannot), then
     // throws ChangedOnDisk when an expected file is no longer the one that was read. A failure
@@ -74,10 +76,11 @@ class Transaction {
     void commit();
 
   private:
+    enum class Kind { Write, Remove, Rename };
     struct Action {
         std::string name;
-        bool isWrite;
-        std::string bytes;
+        Kind kind;
+        std::string bytes;  // the new content, or the file renamed to `name`
     };
     Store& store_;
     std::vector<Action> actions_;
@@ -91,8 +94,9 @@ class Store {
     const std::string& folder() const { return folder_; }
     Sys& sys() { return sys_; }
 
-    // Full path of a file of the folder. Throws CatalogueError for a name that is no plain file
-    // name: empty, "." or "..", or holding "/" or a NUL byte.
+    // Full path of a file of the folder. Names are the file system's bytes (see file_names.h).
+    // Throws CatalogueError for a name that is no plain file name: empty, "." or "..", or holding
+    // "/" or a NUL byte.
     std::string path(std::string_view name) const;
 
     // The file's raw bytes, and its stamp when asked. Only a regular file is read; a FIFO, a

@@ -32,17 +32,25 @@ std::optional<std::string> SettingsReader::next() {
     while (pos_ < text_.size() && text_[pos_] == ' ') ++pos_;
     std::string value;
     if (pos_ < text_.size() && text_[pos_] == '"') {
-        const std::size_t start = pos_ + 1;
-        std::size_t close = start;
-        while (close < text_.size() && text_[close] != '"' && !isLineEnd(text_[close])) ++close;
-        if (close >= text_.size() || text_[close] != '"') return std::nullopt;
-        value = std::string(text_.substr(start, close - start));
-        pos_ = close + 1;
-    } else {
-        const std::size_t start = pos_;
-        while (pos_ < text_.size() && text_[pos_] != ',' && !isLineEnd(text_[pos_])) ++pos_;
-        value = std::string(text_.substr(start, pos_ - start));
+        // A doubled quote inside stands for one quote, so any value can be written back.
+        for (++pos_; pos_ < text_.size() && !isLineEnd(text_[pos_]); ++pos_) {
+            if (text_[pos_] != '"') {
+                value.push_back(text_[pos_]);
+            } else if (pos_ + 1 < text_.size() && text_[pos_ + 1] == '"') {
+                value.push_back(text_[++pos_]);
+            } else {
+                break;
+            }
+        }
+        const bool closed = pos_ < text_.size() && text_[pos_] == '"';
+        if (closed) ++pos_;
+        skipPastDelimiter();
+        if (!closed) return std::nullopt;
+        return value;
     }
+    const std::size_t start = pos_;
+    while (pos_ < text_.size() && text_[pos_] != ',' && !isLineEnd(text_[pos_])) ++pos_;
+    value = std::string(text_.substr(start, pos_ - start));
     skipPastDelimiter();
     return value;
 }
@@ -59,10 +67,18 @@ void SettingsReader::skipPastDelimiter() {
 }
 
 std::string settingsValue(std::string_view value) {
+    // No line can hold a line break: such a value (a folder may have one in its name) is written
+    // empty, so it alone falls back to its default instead of moving every later value.
+    if (value.find_first_of("\r\n") != npos) return "\"\"";
     const bool cut = value.find(',') != npos ||
                      (!value.empty() && (value.front() == ' ' || value.front() == '"'));
     if (!cut) return std::string(value);
-    return "\"" + std::string(value) + "\"";
+    std::string quoted = "\"";
+    for (const char c : value) {
+        quoted.push_back(c);
+        if (c == '"') quoted.push_back('"');
+    }
+    return quoted + "\"";
 }
 
 std::optional<int> checkValue(std::string_view value) {
@@ -108,24 +124,16 @@ std::string defaultSettingsText(std::string_view folder) {
     return text;
 }
 
-std::optional<ExportSettings> decodeSettings(std::string_view bytes) {
+ExportSettings decodeSettings(std::string_view bytes) {
     SettingsReader reader(bytes);
     ExportSettings settings;
-    auto folder = reader.next();
-    if (!folder) return std::nullopt;
-    settings.folder = std::move(*folder);
+    settings.folder = reader.next().value_or("");
     for (int& check : settings.checks) {
         const auto value = reader.next();
-        if (!value) return std::nullopt;
-        const auto number = checkValue(*value);
-        if (!number) return std::nullopt;
-        check = *number;
+        check = value ? checkValue(*value).value_or(0) : 0;
     }
-    auto amount = reader.next();
-    auto position = amount ? reader.next() : std::nullopt;
-    if (!position) return std::nullopt;
-    settings.amount = std::move(*amount);
-    settings.position = std::move(*position);
+    if (auto amount = reader.next()) settings.amount = std::move(*amount);
+    if (auto position = reader.next()) settings.position = std::move(*position);
     return settings;
 }
 

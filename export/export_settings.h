@@ -26,17 +26,20 @@ std::string encodeSettings(const ExportSettings& settings);
 // The defaults file for a default output folder: the folder, six bare "0", "10" and "Top".
 std::string defaultSettingsText(std::string_view folder);
 
-// Reads the nine values by the reading rule. Nothing when a value is missing or a check value is
-// not a number a check box takes; the folder and the position are checked by whoever applies them.
-std::optional<ExportSettings> decodeSettings(std::string_view bytes);
+// Reads the nine values by the reading rule. A value that is missing or unreadable, or a check
+// value that is no number a check box takes, keeps its default (an empty folder); the folder and
+// the position are checked by whoever applies them.
+ExportSettings decodeSettings(std::string_view bytes);
 
 // Reads the values of a settings text one by one: leading spaces are skipped; a value that starts
-// with a double quote runs to the next one on its line (the rest up to the next comma or line end
-// is dropped); any other value runs to the first comma or line end. CR, LF and CR LF end a line.
+// with a double quote runs to the next lone one on its line, a doubled quote inside standing for
+// one (the rest up to the next comma or line end is dropped); any other value runs to the first
+// comma or line end. CR, LF and CR LF end a line.
 class SettingsReader {
   public:
     explicit SettingsReader(std::string_view text) : text_(text) {}
-    // The next value; nothing at the end of the text or at an unclosed quote.
+    // The next value; nothing at the end of the text, or for a quote left open (that value is
+    // skipped and the reader goes on with the next line).
     std::optional<std::string> next();
 
   private:
@@ -45,8 +48,9 @@ class SettingsReader {
     std::size_t pos_ = 0;
 };
 
-// A value as written to the file: quoted when it holds a comma or starts with a space or a quote,
-// so it reads back whole (a value that also holds a quote cannot be stored either way).
+// A value as written to the file: quoted, with its quotes doubled, when it holds a comma or starts
+// with a space or a quote, so it reads back whole; written empty when it holds a line break.
+// Other values are written as they are.
 std::string settingsValue(std::string_view value);
 
 // The check-box value a settings value stands for: a number, surrounding spaces ignored, rounded

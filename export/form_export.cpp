@@ -4,11 +4,9 @@
 #include <vector>
 
 #include "catalogue/catalogue_error.h"
-#include "catalogue/file_text.h"
-#include "catalogue/records.h"
-#include "export/html_page.h"
+#include "catalogue/file_names.h"
 #include "export/last_added.h"
-#include "export/report_table.h"
+#include "export/list_report.h"
 
 namespace exporting {
 
@@ -97,51 +95,45 @@ std::string Form_Export::workingFolder() const {
 }
 
 void Form_Export::LoadSettings() {
-    if (loadSettingsFile()) return;
-    std::vector<std::string> defaults;
-    if (const std::string home = homeFolder(); !home.empty()) defaults.push_back(home);
-    defaults.push_back(workingFolder());
-    for (const std::string& folder : defaults) {
-        try {
-            catalogue::Transaction t = store_.begin();
-            t.write(kSettingsFile, defaultSettingsText(folder));
-            t.commit();
-        } catch (const CatalogueError&) {
-            break;  // the file cannot be replaced: the defaults go straight into the controls
-        }
-        if (loadSettingsFile()) return;
-    }
-    for (const std::string& folder : defaults) {
-        ExportSettings fallback;
-        fallback.folder = folder;
-        if (applySettings(fallback)) return;
-    }
-}
-
-bool Form_Export::loadSettingsFile() {
-    std::optional<ExportSettings> settings;
+    std::optional<ExportSettings> stored;
     try {
-        if (!store_.exists(kSettingsFile)) return false;
-        settings = decodeSettings(store_.readBytes(kSettingsFile));
+        if (store_.exists(kSettingsFile)) stored = decodeSettings(store_.readBytes(kSettingsFile));
     } catch (const CatalogueError&) {
-        return false;
     }
-    return settings && applySettings(*settings);
-}
-
-bool Form_Export::applySettings(const ExportSettings& settings) {
-    if (!settings.folder.starts_with('/')) return false;
-    const std::string drive = driveOf(c_.Drive1.drives(), resolved(settings.folder));
-    if (drive.empty()) return false;
-    loading_ = true;
-    const bool driveSet = c_.Drive1.setDrive(drive);
-    loading_ = false;
-    if (!driveSet || !c_.Dir1.setPath(settings.folder)) return false;
+    ExportSettings settings = stored.value_or(ExportSettings{});
+    // A value that cannot be used costs only itself: the folder falls back to the home folder,
+    // else the working folder, and the other values keep what was read.
+    if (!applyFolder(settings.folder)) {
+        std::vector<std::string> defaults;
+        if (const std::string home = homeFolder(); !home.empty()) defaults.push_back(home);
+        defaults.push_back(workingFolder());
+        for (const std::string& folder : defaults) {
+            if (applyFolder(folder)) break;
+        }
+    }
     ui::CheckBox* boxes[] = {&c_.Checkart,  &c_.Checkhtml, &c_.Checkcounter,
                              &c_.Checkdate, &c_.Checkline, &c_.Check_lastadd};
     for (std::size_t i = 0; i < settings.checks.size(); ++i) boxes[i]->setValue(settings.checks[i]);
     c_.Text2.setText(settings.amount);
-    return c_.Combo1.setText(settings.position);
+    if (!c_.Combo1.setText(settings.position)) c_.Combo1.setText(ExportSettings{}.position);
+    if (stored) return;
+    try {
+        catalogue::Transaction t = store_.begin();
+        t.write(kSettingsFile, defaultSettingsText(c_.Dir1.path()));
+        t.commit();
+    } catch (const CatalogueError&) {
+        // The file cannot be written here: the defaults stay in the controls all the same.
+    }
+}
+
+bool Form_Export::applyFolder(const std::string& folder) {
+    if (!folder.starts_with('/')) return false;
+    const std::string drive = driveOf(c_.Drive1.drives(), resolved(folder));
+    if (drive.empty()) return false;
+    loading_ = true;
+    const bool driveSet = c_.Drive1.setDrive(drive);
+    loading_ = false;
+    return driveSet && c_.Dir1.setPath(folder);
 }
 
 void Form_Export::SaveSettings() {
@@ -157,50 +149,29 @@ void Form_Export::SaveSettings() {
 }
 
 std::string Form_Export::BuildReport(const std::string& list) {
-    c_.Check_noinfo.setValue(form1_.HasInformation(list) ? 0 : 1);
-
-    const std::string entries = store_.readText(catalogue::entryFile(list));
-    const bool articleNumbers = c_.Checkart.value() == 1;
-    const std::string articles =
-        articleNumbers ? store_.readText(catalogue::articleFile(list)) : std::string();
-
     const ui::ListBox& titlesBox = form1_.controls().List1;
     std::vector<std::string> titles;
     titles.reserve(static_cast<std::size_t>(titlesBox.count()));
     for (int i = 0; i < titlesBox.count(); ++i) titles.push_back(titlesBox.itemText(i));
 
-    ReportOptions options;
-    options.articleNumbers = articleNumbers;
-    options.information = c_.Check_noinfo.value() != 1;
-    options.date = c_.Checkdate.value() == 1;
-    options.separatorLines = c_.Checkline.value() == 1;
-    options.counter = c_.Checkcounter.value() == 1;
-    const std::string date = options.date ? platform_.shortDate() : std::string();
-    std::string report = BuildReportTable(list, entries, articles, titles, options, date);
-
-    // The top text is optional: a file that is missing or cannot be read is simply left out.
-    try {
-        if (auto top = store_.readTextIfExists(list + ".top")) report.insert(0, *top);
-    } catch (const CatalogueError&) {
-    }
-
-    const std::string amount = c_.Text2.text();
-    const std::string position = c_.Combo1.text();
-    LastAddedRequest request;
-    request.include = c_.Check_lastadd.value() == 1;
-    request.amountText = amount;
-    request.position = position;
-    request.information = options.information;
-    request.titleCount = titles.size();
-    LastAddedResult withSection = BuildLastAdded(entries, std::move(report), request);
-    if (withSection.refused) {
+    ReportChoices choices;
+    choices.articleNumbers = c_.Checkart.value() == 1;
+    choices.counter = c_.Checkcounter.value() == 1;
+    choices.date = c_.Checkdate.value() == 1;
+    choices.separatorLines = c_.Checkline.value() == 1;
+    choices.noInformation = c_.Check_noinfo.value() == 1;
+    choices.lastAdded = c_.Check_lastadd.value() == 1;
+    choices.amountText = c_.Text2.text();
+    choices.position = c_.Combo1.text();
+    const std::string date = choices.date ? platform_.shortDate() : std::string();
+    ListReport report = buildListReport(store_, list, titles, choices, date);
+    if (report.flag == 1) c_.Check_noinfo.setValue(0);
+    if (report.flag == 0) c_.Check_noinfo.setValue(1);
+    if (report.lastAddedRefused) {
         c_.Check_lastadd.setValue(0);
         platform_.messageBox(kTooManyLastAdded, 16, kTooManyLastAddedTitle);
     }
-    report = std::move(withSection.report);
-
-    report.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
-    return report;
+    return std::move(report.text);
 }
 
 void Form_Export::RunExport() {
@@ -216,12 +187,11 @@ void Form_Export::RunExport() {
             std::string folder = c_.Dir1.path();
             if (!folder.ends_with('/')) folder.push_back('/');
             c_.Text1.setText(folder);
-            const std::string out = c_.Text1.text();
-            if (c_.Checkhtml.value() == 1) {
-                store_.writeReport(out + list + ".html", HtmlPage(list, report));
-            } else {
-                store_.writeReport(out + list + ".TXT", report + "\r\n");
-            }
+            // The folder is the file system's bytes; the list name is converted to match them.
+            const std::string out = folder + catalogue::fileSystemName(list);
+            const bool html = c_.Checkhtml.value() == 1;
+            store_.writeReport(out + (html ? ".html" : ".TXT"),
+                               reportFileBytes(list, report, html));
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);
             form1_.showError(error.file(), error.reason());

@@ -64,8 +64,9 @@ class Form_Export {
     // and an older report stays as it was. Without a selected list it only beeps.
     void RunExport();
 
-    // Loads "export.dat" into the controls. Any failure writes the defaults file (the home folder,
-    // else the working folder) and loads that; it never reports and never loops.
+    // Loads "export.dat" into the controls. A value that cannot be used gets its default (for the
+    // folder: the home folder, else the working folder) and the others stay; a missing file is
+    // written with the defaults. It never reports.
     void LoadSettings();
     // Writes the controls' settings to "export.dat". Throws CatalogueError.
     void SaveSettings();
@@ -76,8 +77,8 @@ class Form_Export {
     std::string BuildReport(const std::string& list);
 
   private:
-    bool loadSettingsFile();
-    bool applySettings(const ExportSettings& settings);
+    // Shows `folder` (file-system bytes) in Drive1 and Dir1; false when it cannot be shown.
+    bool applyFolder(const std::string& folder);
     std::string workingFolder() const;
 
     Form_ExportControls c_;

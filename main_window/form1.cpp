@@ -3,6 +3,7 @@
 #include <filesystem>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 
 namespace main_window {
@@ -71,7 +72,7 @@ void Form1::Form_Load() {
     lock_ = std::make_unique<catalogue::FolderLock>(store_.folder());
     if (lock_->state() == catalogue::FolderLock::State::Taken) {
         platform_.messageBox("Pemla is already running on the folder \"" +
-                                 absoluteFolder(store_.folder()) +
+                                 catalogue::shownName(absoluteFolder(store_.folder())) +
                                  "\". Use the window that is open there: a second copy could "
                                  "undo its changes, so this one ends without changing anything.",
                              16, "Error");
@@ -82,11 +83,16 @@ void Form1::Form_Load() {
         store_.recover();
         fillSuggestions("type.dat", c_.Combo1);
         fillSuggestions("information.dat", c_.Combo3);
+        // Lists saved by earlier builds carry Latin-1 file names; they move to today's names
+        // together. Should that fail, the start goes on and each such list says so when opened.
+        const std::vector<std::string> lists = store_.readLines("pemla.dat");
+        guarded([&] { catalogue::renameLegacyListFiles(store_, lists); });
         LoadListNames();
         return;
     } catch (const CatalogueError& error) {
-        platform_.messageBox("Pemla cannot start: the file \"" + error.file() +
-                                 "\" in the folder \"" + absoluteFolder(store_.folder()) +
+        platform_.messageBox("Pemla cannot start: the file \"" +
+                                 catalogue::shownName(error.file()) + "\" in the folder \"" +
+                                 catalogue::shownName(absoluteFolder(store_.folder())) +
                                  "\" cannot be used (" + error.reason() + ").",
                              16, "Error");
     }
@@ -153,7 +159,7 @@ std::string Form1::selectedList() const {
 namespace {
 
 std::string errorText(const std::string& file, const std::string& reason) {
-    return "The file \"" + file + "\" could not be used:\r\n" + reason + ".";
+    return "The file \"" + catalogue::shownName(file) + "\" could not be used:\r\n" + reason + ".";
 }
 
 }  // namespace
@@ -171,7 +177,7 @@ void Form1::guarded(const std::function<void()>& body, bool busy) {
                          ? std::string(
                                "An earlier change that was left unfinished has now been "
                                "completed, so nothing else was done.")
-                         : "The file \"" + error.file() +
+                         : "The file \"" + catalogue::shownName(error.file()) +
                                "\" was changed on disk after this window read it, so nothing "
                                "was written.";
             prompt +=

@@ -2,6 +2,7 @@
 // files in one transaction, so they change together or not at all.
 #include "catalogue/article_numbers.h"
 #include "catalogue/catalogue_error.h"
+#include "catalogue/entry_rules.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
@@ -23,18 +24,8 @@ char upperFirst(const std::string& text) {
 
 catalogue::Entry Form1::fieldsAsEntry() const {
     catalogue::Entry entry{c_.Text1.text(), c_.Combo1.text(), c_.Combo2.text(), c_.Combo3.text()};
-    if (entry.title.empty()) throw Refusal{"Please type a title first."};
-    const std::pair<const char*, const std::string*> fields[] = {
-        {"The title", &entry.title},
-        {"The type", &entry.type},
-        {"The number of discs", &entry.discs},
-        {"The information", &entry.information}};
-    for (const auto& [label, value] : fields) {
-        const std::string problem = catalogue::valueProblem(*value, value == &entry.title);
-        if (!problem.empty()) {
-            throw Refusal{std::string(label) + " cannot hold " + problem +
-                          ": the list's files use it to mark their records."};
-        }
+    if (std::string refusal = catalogue::entryRefusal(entry); !refusal.empty()) {
+        throw Refusal{std::move(refusal)};
     }
     return entry;
 }
@@ -51,22 +42,12 @@ void Form1::NextArticleNumber(char firstCharacter, const std::string& list,
                               catalogue::Transaction& t) {
     const std::string file = catalogue::counterFile(list);
     const std::string counter = t.readText(file);
-    const char letter = catalogue::articleLetter(firstCharacter);
-    switch (catalogue::counterProblem(counter, letter)) {
-        case catalogue::CounterProblem::Exhausted:
-            throw Refusal{std::string("Every article number of the letter ") + letter + " (" +
-                          letter + "001 to " + letter +
-                          "999) has been handed out in this list, so no other title that files "
-                          "under this letter can be stored in it."};
-        case catalogue::CounterProblem::Damaged:
-            throw CatalogueError(file,
-                                 std::string("the record of the letter ") + letter + " is damaged");
-        case catalogue::CounterProblem::None:
-            break;
-    }
-    catalogue::ArticleNumberResult next = catalogue::nextArticleNumber(counter, firstCharacter);
-    t.write(file, next.counterText);
-    ArticleNumber = next.number;
+    std::string refusal;
+    std::optional<catalogue::ArticleNumberResult> next =
+        catalogue::handOutNumber(counter, file, firstCharacter, refusal);
+    if (!next) throw Refusal{refusal};
+    t.write(file, next->counterText);
+    ArticleNumber = next->number;
 }
 
 void Form1::WriteEmptyList(const std::string& name, catalogue::Transaction& t) {
@@ -87,14 +68,13 @@ void Form1::Command_add_Click() {
                 "to, then press Add again."};
         }
         const catalogue::Entry entry = fieldsAsEntry();
-        if (catalogue::findTitleLine(ListText, entry.title) != std::string::npos &&
-            entry.title != " ") {
-            platform_.messageBox("Title already exist, change name and try again!", 16, "Error");
+        if (catalogue::isDuplicateTitle(ListText, entry.title)) {
+            platform_.messageBox(catalogue::kDuplicateTitle, 16, "Error");
             return;
         }
         requireWholeList(list);
         if (EntryCount >= catalogue::kMaxEntries) {
-            throw Refusal{"This list is full: a list holds at most 32767 titles."};
+            throw Refusal{catalogue::kListFull};
         }
         catalogue::Transaction t = store_.begin();
         t.expect(catalogue::entryFile(list), listStamp_);

@@ -89,7 +89,8 @@ void Form1::ResetEntryFields() {
 }
 
 void Form1::limitTyping(ui::ComboBox& box, std::size_t limit, int& key) {
-    if (key != 8 && box.text().size() >= limit) key = 0;
+    // Judged by the text after the key: a key typed over a selection replaces it.
+    if (key != 8 && box.text().size() - box.selectedLength() >= limit) key = 0;
 }
 
 std::optional<std::string> Form1::selectedTitle() const {

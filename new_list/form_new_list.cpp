@@ -3,17 +3,9 @@
 #include <string>
 
 #include "catalogue/file_text.h"
-#include "catalogue/latin1.h"
-#include "catalogue/name_probe.h"
 #include "catalogue/records.h"
 
 namespace new_list {
-
-namespace {
-
-const std::string kIndexFile = "pemla.dat";
-
-}  // namespace
 
 Form_new_list::Form_new_list(const Form_new_listControls& controls, ui::Platform& platform,
                              catalogue::Store& store, main_window::Form1& form1)
@@ -57,29 +49,19 @@ void Form_new_list::Command2_Click() {
 
 void Form_new_list::createList() {
     const std::string name = c_.Text1.text();
-    if (!catalogue::probeFileName(store_, name)) {
-        platform_.messageBox(kBadName, 16, "Error");
+    const catalogue::NewListCheck check = catalogue::checkNewListName(store_, name);
+    if (check.refusal == catalogue::kCatalogueFull)
+        throw main_window::Form1::Refusal{check.refusal};
+    if (!check.refusal.empty()) {
+        platform_.messageBox(check.refusal, 16, "Error");
         return;
     }
-    const std::string index = store_.readText(kIndexFile);
-    // Both tests match anywhere: a name that a listed name ends with, a trailing part of a
-    // reserved word, and the empty name are all refused.
-    const bool listed = catalogue::findIgnoreCase(index, name + "\r") != std::string::npos;
-    const bool reserved =
-        catalogue::findIgnoreCase(kReservedNames, name + "|") != std::string::npos;
-    if (listed || reserved) {
-        platform_.messageBox(kNameInUse, 16, "Error");
-        return;
-    }
-    // List-box rows are counted in 16 bits, so the catalogue holds at most 32767 lists.
-    if (catalogue::splitLines(index).size() >= 32767) {
-        throw main_window::Form1::Refusal{"The catalogue is full: it holds at most 32767 lists."};
-    }
+    const std::string& index = check.index;
 
     // The index line and the four files appear together or not at all, so a failure never
     // leaves a listed name without its files.
     catalogue::Transaction change = store_.begin();
-    change.write(kIndexFile, index + name + "\r\n");
+    change.write(catalogue::kIndexFile, index + name + "\r\n");
     change.write(catalogue::entryFile(name), catalogue::kSkeletonEntries);
     change.write(catalogue::articleFile(name), catalogue::kSkeletonArticles);
     change.write(catalogue::counterFile(name), catalogue::kSkeletonCounter);

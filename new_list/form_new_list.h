@@ -1,5 +1,6 @@
 #pragma once
 
+#include "catalogue/entry_rules.h"
 #include "catalogue/store.h"
 #include "main_window/form1.h"
 #include "ui/controls.h"
@@ -19,11 +20,9 @@ struct Form_new_listControls {
 
 inline constexpr const char* kNewListCaption = "Create new list";
 inline constexpr const char* kNewListPrompt = "Name of new list (only file allowed charters!)";
-inline constexpr const char* kNameInUse = "A list with that name already exist!";
-inline constexpr const char* kBadName = "Ya can't use /\\:?*<>\" in the name!";
-// Names a list may not take: the base names of the program's own files, and "print".
-inline constexpr const char* kReservedNames = "export|print|pemla|information|type|";
-inline constexpr int kMaxNameLength = 26;
+using catalogue::kBadName;
+using catalogue::kMaxNameLength;
+using catalogue::kNameInUse;
 
 class Form_new_list {
   public:

@@ -76,6 +76,8 @@ class ComboBox {
     // Assignment by code: neither the key handler nor any limit applies. A pick-only box takes
     // only one of its items and returns false for any other text.
     virtual bool setText(const std::string& text) = 0;
+    // How many characters of the text the user has selected: a typed key replaces them.
+    virtual std::size_t selectedLength() const = 0;
     virtual void setEnabled(bool enabled) = 0;
     virtual bool isEnabled() const = 0;
 
@@ -115,7 +117,8 @@ class DriveList {
     Handler onChange;
 };
 
-// A folder chooser. Its path has no trailing separator except at a volume's root.
+// A folder chooser. Its path has no trailing separator except at a volume's root. Paths here, and
+// the drives above, are the file system's own bytes, not Latin-1 text.
 class DirList {
   public:
     virtual ~DirList() = default;

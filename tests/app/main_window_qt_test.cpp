@@ -2,8 +2,10 @@
 // handlers holds when a user clicks and types.
 #include <gtest/gtest.h>
 
+#include <QApplication>
 #include <QComboBox>
 #include <QElapsedTimer>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -16,6 +18,7 @@
 #include "app/main_window_view.h"
 #include "catalogue/store.h"
 #include "main_window/form1.h"
+#include "main_window/title_finder.h"
 #include "tests/support/temp_folder.h"
 #include "ui/qt/qt_platform.h"
 
@@ -75,10 +78,11 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     EXPECT_EQ(w.view.List1->count(), 1);
     EXPECT_EQ(w.view.Label2->text(), QStringLiteral("... amount:  1 ..."));
 
-    // Add "Abbey Road" of type Music CD, 2 discs.
+    // Add "Abbey Road" of type Music CD, 2 discs: "2" typed over the selected "Disc(s)" fits
+    // the limit of six.
     w.typeInto(w.view.Text1, QStringLiteral("Abbey Road"));
     w.view.Combo1->setCurrentIndex(0);
-    w.view.Combo2->lineEdit()->clear();
+    w.view.Combo2->lineEdit()->selectAll();
     w.typeInto(w.view.Combo2, QStringLiteral("2"));
     w.click(w.view.Command_add);
     EXPECT_EQ(folder.get("Music.dat"),
@@ -89,6 +93,9 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     ASSERT_EQ(w.view.List1->count(), 2);
     EXPECT_EQ(w.view.List1->item(0)->text(), QStringLiteral("Abbey Road"));
     EXPECT_TRUE(w.view.Text1->text().isEmpty());
+    // After the reset, Down starts again at the first suggestion.
+    QTest::keyClick(w.view.Combo1, Qt::Key_Down);
+    EXPECT_EQ(w.view.Combo1->currentText(), QStringLiteral("Music CD"));
 
     // Select it, change its discs, confirm.
     answerAll(ui::Answer::Yes);
@@ -171,7 +178,25 @@ TEST(MainWindowOnQt, TheLargestListOpensQuickly) {
     timer.restart();
     w.select(w.view.List1, w.view.List1->item(20000)->text());
     const qint64 selectMs = timer.elapsed();
-    std::cout << "32767 entries on Qt: open " << openMs << " ms, select " << selectMs << " ms\n";
+
+    // The "Find title" box: each key searches every row; F3 and Shift+F3 step and wrap.
+    main_window::TitleFinder finder(w.form);
+    w.view.connectFinder(finder);
+    w.view.widget()->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(w.view.widget()));
+    timer.restart();
+    w.typeInto(w.view.Text_find, QStringLiteral("TITLE"));
+    const qint64 keyMs = timer.elapsed() / 5;
+    std::vector<int> rows = {w.view.List1->currentRow()};
+    for (auto modifier : {Qt::ShiftModifier, Qt::NoModifier}) {
+        QTest::keyClick(w.view.Text_find, Qt::Key_F3, modifier);
+        rows.push_back(w.view.List1->currentRow());
+    }
+    EXPECT_EQ(rows, (std::vector<int>{0, 32766, 0}));
+    EXPECT_EQ(w.view.Text1->text(), w.view.List1->item(0)->text());
+    EXPECT_LT(keyMs, 1000);
+    std::cout << "32767 entries on Qt: open " << openMs << " ms, select " << selectMs
+              << " ms, find key " << keyMs << " ms\n";
     // Generous bounds that still catch work growing with the square of the list.
     EXPECT_LT(openMs, 3000);
     EXPECT_LT(selectMs, 1000);

@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 
@@ -62,6 +63,16 @@ TEST(FileText, NumbersReadAndWritten) {
 }
 
 constexpr auto npos = std::string_view::npos;
+
+TEST(FileNames, EveryLatin1NameHasOneUtf8NameAndOnlyThoseDecode) {
+    std::string all;
+    for (int c = 1; c < 256; ++c) all.push_back(static_cast<char>(c));
+    EXPECT_EQ(latin1Name(fileSystemName(all)), all);
+    // Overlong, beyond Latin-1, cut short, a stray continuation byte: shown as the bytes.
+    for (const std::string bytes :
+         {"\xC1\x81", "\xD0\x94", "\xE2\x82\xAC", "a\xC3", "\xC3(", "\xA9"})
+        EXPECT_EQ(shownName(bytes), bytes);
+}
 
 TEST(Latin1, FoldsAsciiAndAccentedLettersOnly) {
     EXPECT_TRUE(equalsIgnoreCase("Star Wars", "sTAR wARS"));

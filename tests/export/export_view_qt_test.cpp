@@ -11,6 +11,7 @@
 #include <QTest>
 #include <QTreeView>
 #include <cstdlib>
+#include <filesystem>
 #include <fstream>
 #include <iterator>
 
@@ -29,14 +30,17 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     test_support::TempFolder folder;
     test_support::TempFolder home;
     test_support::TempFolder out;
-    ::setenv("HOME", home.path().c_str(), 1);
+    // A localized home folder, and a list whose Latin-1 name has its files under UTF-8 names.
+    const std::string homeFolder = home.file("M\xC3\xBAsica");
+    std::filesystem::create_directory(homeFolder);
+    ::setenv("HOME", homeFolder.c_str(), 1);
     folder.put("type.dat", "Types\r\nMusic CD\r\n");
     folder.put("information.dat", "Information\r\nOriginal\r\n");
-    folder.put("pemla.dat", "Movies\r\n");
-    folder.put("Movies.dat", data("movies.dat"));
-    folder.put("Movies.art", data("movies.art"));
-    folder.put("Movies.arn", "A#003\r\n");
-    folder.put("Movies.inf", " 1 \r\n");
+    folder.put("pemla.dat", "Canci\xF3nes\r\n");
+    folder.put("Canci\xC3\xB3nes.dat", data("movies.dat"));
+    folder.put("Canci\xC3\xB3nes.art", data("movies.art"));
+    folder.put("Canci\xC3\xB3nes.arn", "A#003\r\n");
+    folder.put("Canci\xC3\xB3nes.inf", " 1 \r\n");
 
     ui::qt::QtPlatform platform;
     app::Program program(folder.path(), platform);
@@ -52,7 +56,7 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     });
 
     program.start();
-    mainView.List_list->setCurrentRow(0);  // the user picks "Movies"
+    mainView.List_list->setCurrentRow(0);  // the user picks the list
     ASSERT_EQ(mainView.List1->count(), 10);
     QTest::mouseClick(mainView.Command_export, Qt::LeftButton);
     QWidget* dialog = view.widget();
@@ -61,17 +65,17 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     EXPECT_FALSE(mainView.widget()->isEnabled());
     EXPECT_FALSE(view.Check_noinfo->isVisible());
     EXPECT_FALSE(view.Text1->isVisible());
-    EXPECT_EQ(view.controls().Dir1.path(), home.path());
+    EXPECT_EQ(view.controls().Dir1.path(), homeFolder);
 
     // The user picks the output folder in the folder list and exports as text, then as HTML.
     auto* model = static_cast<QFileSystemModel*>(view.Dir1->model());
     view.Dir1->setCurrentIndex(model->index(QString::fromStdString(out.path())));
     ASSERT_EQ(view.controls().Dir1.path(), out.path());
     QTest::mouseClick(view.Command1, Qt::LeftButton);
-    EXPECT_TRUE(out.get("Movies.TXT").starts_with(".[Movies]"));
+    EXPECT_TRUE(out.get("Canci\xC3\xB3nes.TXT").starts_with(".[Canci\xF3nes]"));
     QTest::mouseClick(view.Checkhtml, Qt::LeftButton);
     QTest::mouseClick(view.Command1, Qt::LeftButton);
-    EXPECT_TRUE(out.get("Movies.html").starts_with("<html>\r\n<head>\r\n<title>Movies</title>"));
+    EXPECT_TRUE(out.get("Canci\xC3\xB3nes.html").starts_with("<html>\r\n<head>\r\n<title>Canci"));
     EXPECT_EQ(boxes, std::vector<std::string>(2, "Done: Export done!"));
     EXPECT_TRUE(dialog->isEnabled());
 
@@ -94,6 +98,24 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     EXPECT_TRUE(mainView.widget()->isEnabled());
     EXPECT_EQ(folder.get("export.dat"),
               out.path() + "\r\n 0 \r\n 1 \r\n 0 \r\n 0 \r\n 0 \r\n 0 \r\n12\r\nTop\r\n");
+
+    // Any folder name the system allows is exported to, saved, and found again on reopening.
+    for (const std::string name :
+         {"M\xC3\xBCsik",
+          "\xD0\x94\xD0\xBE\xD0\xBA\xD1\x83\xD0\xBC\xD0\xB5\xD0\xBD\xD1\x82\xD1\x8B",
+          "\xE9\x9F\xB3\xE6\xA5\xBD", "a, \"b\"", " lead"}) {
+        SCOPED_TRACE(name);
+        const std::string chosen = out.file(name);
+        std::filesystem::create_directory(chosen);
+        for (int opening = 0; opening < 2; ++opening) {
+            QTest::mouseClick(mainView.Command_export, Qt::LeftButton);
+            if (opening == 0) view.Dir1->setCurrentIndex(model->index(QString::fromUtf8(chosen)));
+            EXPECT_EQ(view.controls().Dir1.path(), chosen);
+            QTest::mouseClick(view.Command1, Qt::LeftButton);
+            dialog->close();
+        }
+        EXPECT_TRUE(std::filesystem::exists(chosen + "/Canci\xC3\xB3nes.html"));
+    }
     ui::qt::QtPlatform::setAnswerHook(nullptr);
 }
 

@@ -50,30 +50,33 @@ TEST(ExportSettingsLoad, NoSettingsWritesTheDefaultsForHomeOrElseTheWorkingFolde
     }
 }
 
-TEST(ExportSettingsLoad, SettingsLoadAsTheyAreOrAreReplacedWholeByTheDefaults) {
+TEST(ExportSettingsLoad, EachValueLoadsAsItIsOrAloneFallsBackToItsDefault) {
     using Lines = std::vector<std::string>;
     const std::pair<Lines, Lines> cases[] = {
-        // the file, and what the dialog shows
+        // the file, and what the dialog shows ("~" stands for the home folder)
         {{"/", " 1 ", "1", " 0 ", "0", "2", "", "ab", "Bottom"},
          {"/", "1", "1", "0", "0", "2", "0", "ab", "Bottom"}},
-        {{"/", " 1 ", " 1 ", " 0 "}, {}},  // partial file
-        {{"/no/such/folder/anywhere", "1", "1", "1", "1", "1", "1", "5", "Top"}, {}},
-        {{"/", "1", "1", "3", "1", "1", "1", "5", "Top"}, {}},     // not a check value
-        {{"/", "1", "1", "1", "1", "1", "1", "5", "Middle"}, {}},  // not a position
-        {{"relative/folder", "1", "1", "1", "1", "1", "1", "5", "Top"}, {}},
+        {{"/", " 1 ", " 1 ", " 0 "}, {"/", "1", "1", "0", "0", "0", "0", "10", "Top"}},
+        {{"/no/such/folder", "1", "0", "1", "1", "1", "1", "5", "Bottom"},
+         {"~", "1", "0", "1", "1", "1", "1", "5", "Bottom"}},
+        {{"/", "1", "1", "3", "1", "1", "1", "5", "Bottom"},
+         {"/", "1", "1", "0", "1", "1", "1", "5", "Bottom"}},
+        {{"/", "1", "1", "1", "1", "1", "1", "5", "Middle"},
+         {"/", "1", "1", "1", "1", "1", "1", "5", "Top"}},
+        {{"relative/folder", "1", "1", "1", "1", "1", "1", "\"\"\"5\"", "Top"},
+         {"~", "1", "1", "1", "1", "1", "1", "\"5", "Top"}},
+        {{"\"/open", "1", "1", "1", "1", "1", "1", "5", "Top"},
+         {"~", "1", "1", "1", "1", "1", "1", "5", "Top"}},
     };
-    for (const auto& [file, expected] : cases) {
+    for (auto [file, expected] : cases) {
         ExportFixture f;
         f.openMovies();
         f.main.folder.put("export.dat", settings(file));
         f.openDialog();
         SCOPED_TRACE(file[0] + " / " + file.back());
-        if (expected.empty()) {
-            expectDefaults(f, f.home.path());
-        } else {
-            EXPECT_EQ(shown(f), settings(expected));
-            EXPECT_EQ(f.main.folder.get("export.dat"), settings(file));  // nothing replaced
-        }
+        if (expected[0] == "~") expected[0] = f.home.path();
+        EXPECT_EQ(shown(f), settings(expected));
+        EXPECT_EQ(f.main.folder.get("export.dat"), settings(file));  // nothing replaced on load
     }
 }
 

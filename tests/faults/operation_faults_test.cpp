@@ -8,6 +8,7 @@
 #include <iostream>
 
 #include "catalogue/file_text.h"
+#include "catalogue/list_import.h"
 #include "tests/faults/fault_rig.h"
 
 namespace faults {
@@ -23,7 +24,8 @@ struct Operation {
     int exportDialog;   // -1: closed; 0, 1: open on text or HTML settings
     std::vector<Answer> answers;
     void (*act)(Rig&);
-    bool onlyList = false;  // the index holds "Solo" alone
+    bool onlyList = false;      // the index holds "Solo" alone
+    bool earlierBuild = false;  // "B\xFChne" has files named as an earlier build named them
 };
 
 // The user types an entry and presses the button.
@@ -46,6 +48,18 @@ void saveExportSettings(Rig& r) {
 void writeReport(Rig& r) {
     r.exportView.Command1.click();
 }
+// An import as the command runs it, its failures shown as the command prints them.
+void importRows(Rig& r, const char* list) {
+    r.form.guarded([&] {
+        const std::string rows = "title,type\r\nDylan,LP\r\nBlur,dup\r\n\"Zappa, Frank\",CD\r\n";
+        const catalogue::ImportResult result = catalogue::importCsv(r.store, list, rows);
+        if (!result.problem.empty()) r.platform.messageBox(result.problem, 16, "Error");
+    });
+}
+void restart(Rig& r) {
+    if (r.view.window.isLoaded()) r.view.window.unload();
+    r.start();
+}
 
 const Answer kYes = Answer::Yes;
 // clang-format off
@@ -63,6 +77,9 @@ const Operation kOperations[] = {
     {"SaveExportSettings", "Rock", nullptr, 0, {}, saveExportSettings},
     {"WriteReportAsText", "Rock", nullptr, 0, {Answer::Ok}, writeReport},
     {"WriteReportAsHtml", "Rock", nullptr, 1, {Answer::Ok}, writeReport},
+    {"ImportIntoAList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Rock"); }},
+    {"ImportIntoANewList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Blues"); }},
+    {"RenameFilesOfAnEarlierBuild", nullptr, nullptr, -1, {}, restart, false, true},
 };
 // clang-format on
 
@@ -86,6 +103,11 @@ void setUp(Rig& r, const Operation& op) {
     r.put("pemla.dat", op.onlyList ? crlf({"Solo"}) : crlf({"Rock", "Jazz", "Solo"}));
     const char* html = op.exportDialog == 1 ? "1" : "0";
     r.put("export.dat", crlf({r.out, "0", html, "0", "0", "0", "0", "10", "Top"}));
+    if (op.earlierBuild) {
+        r.putList("B\xFChne", kAbbaDat, crlf({"Abba Gold#*\\A001"}), crlf({"A#002"}));
+        r.put("pemla.dat", crlf({"Rock", "B\xFChne"}));
+        return;  // the start is the operation
+    }
     r.start();
     if ((op.list != nullptr && !r.open(op.list)) || (op.entry != nullptr && !r.select(op.entry)) ||
         (op.exportDialog >= 0 && !r.view.Command_export.click())) {
@@ -121,11 +143,13 @@ std::pair<Files, Files> reference(const Operation& op) {
     return {before, r.files()};
 }
 
-// The file an error box names: `The file "X" could not be used: ...`.
+// The file an error box names: `The file "X" could not be used: ...`, or at the start
+// `Pemla cannot start: the file "X" ...`.
 std::string namedFile(const std::string& prompt) {
-    const std::size_t lead = std::string("The file \"").size();
-    return prompt.starts_with("The file \"") ? prompt.substr(lead, prompt.find('"', lead) - lead)
-                                             : std::string();
+    const std::size_t at = prompt.find("file \"");
+    if (at == std::string::npos) return {};
+    const std::size_t lead = at + std::string("file \"").size();
+    return prompt.substr(lead, prompt.find('"', lead) - lead);
 }
 
 class OperationFaults : public ::testing::TestWithParam<Operation> {};

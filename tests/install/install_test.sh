@@ -28,6 +28,11 @@ nodisplay=(env -u DISPLAY -u WAYLAND_DISPLAY -u QT_QPA_PLATFORM HOME="$work/home
 "${nodisplay[@]}" ./pemla --help >"$work/out" 2>"$work/err"
 grep -q -- '--data <folder>' "$work/out" && [ ! -s "$work/err" ] || fail "--help"
 [ "$("${nodisplay[@]}" ./pemla --version)" = "pemla 0.90" ] || fail "--version"
+# So do export and import; a file named relative to the shell's folder is found there.
+printf 'title,discs\r\nMiles,2\r\n' >"$work/in.csv"
+"${nodisplay[@]}" ./pemla --data "$work/cli" import Jazz ../in.csv >/dev/null || fail "import"
+[ "$("${nodisplay[@]}" ./pemla --data "$work/cli" export jazz --csv)" = \
+  "$(printf 'title,type,discs,information,article number\r\nMiles,,2,,M001\r')" ] || fail "export"
 status=0
 "${nodisplay[@]}" ./pemla --bogus >"$work/out" 2>"$work/err" || status=$?
 [ "$status" -eq 2 ] && [ ! -s "$work/out" ] && grep -q '^Usage: pemla' "$work/err" ||

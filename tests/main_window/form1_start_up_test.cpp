@@ -41,6 +41,29 @@ TEST_F(Form1Test, OneLineSuggestionFilesAndAnEmptyIndexStartWithEmptyBoxes) {
     EXPECT_TRUE(platform.shown().empty());
 }
 
+// An earlier build named a list's files with the Latin-1 bytes of its name. At the start they
+// take their UTF-8 names, bytes untouched, and the list works on as before.
+TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
+    putRock();
+    const std::string latin1 = "B\xFChne", utf8 = "B\xC3\xBChne";
+    folder.put("pemla.dat", crlf({"Rock", latin1}));
+    for (const std::string ending : {".dat", ".art", ".arn", ".inf", ".top"})
+        folder.put(latin1 + ending, ending == ".dat"   ? entries(rock)
+                                    : ending == ".inf" ? " 1 "
+                                                       : ending);
+    folder.put(utf8 + ".top", "newer");  // a file of the new name is never replaced
+    Files old = snapshot();
+    for (const std::string ending : {".dat", ".art", ".arn", ".inf"})
+        old[utf8 + ending] = old.extract(latin1 + ending).mapped();
+    start();
+    EXPECT_EQ(snapshot(), old);
+    open(latin1);
+    fill({"New", "CD", "1", "x"});
+    view.Command_add.click();
+    EXPECT_EQ(folder.get(utf8 + ".dat"), entries(rock) + entries({{"New", "CD", "1", "x"}}));
+    EXPECT_TRUE(platform.shown().empty());
+}
+
 // "Search" needs a selected list, "Export" one with entries shown; otherwise they beep.
 TEST_F(Form1Test, DialogsOpenOnlyOnceAListIsSelectedAndOpen) {
     MemoryWindow newList, search, exporter;

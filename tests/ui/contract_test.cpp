@@ -3,16 +3,20 @@
 #include <gtest/gtest.h>
 
 #include <QApplication>
+#include <QClipboard>
 #include <QComboBox>
+#include <QDate>
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QLocale>
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
 #include <deque>
 #include <map>
 #include <memory>
+#include <tuple>
 
 #include "ui/memory/memory_controls.h"
 #include "ui/qt/qt_controls.h"
@@ -51,6 +55,7 @@ struct MemoryBackend {
     void select(memory::MemoryListBox& box, int index) { box.userSelect(index); }
     std::vector<std::string> displayed(memory::MemoryListBox& box) { return box.items(); }
     void type(auto& box, const std::string& keys) { box.type(keys); }
+    void selectAll(memory::MemoryComboBox& box) { box.userSelectAll(); }
     void closeBox() { window.userClose(); }
 };
 
@@ -104,6 +109,9 @@ struct QtBackend {
     }
     void type(const auto& box, const std::string& keys) {
         typeText(widgetOf.at(&box), QString::fromLatin1(keys.data(), std::ssize(keys)));
+    }
+    void selectAll(ComboBox& box) {
+        static_cast<QComboBox*>(widgetOf.at(&box))->lineEdit()->selectAll();
     }
     void closeBox() { top.close(); }
 };
@@ -173,7 +181,7 @@ TYPED_TEST(ControlContract, ComboBoxKeyHandlerCanDiscardKeys) {
     std::vector<int> keys;
     box.onKeyPress = [&](int& key) {
         keys.push_back(key);
-        if (key != 8 && box.text().size() >= 3) key = 0;
+        if (key != 8 && box.text().size() - box.selectedLength() >= 3) key = 0;
     };
     box.setText("");
     this->b.type(box, "abcde");
@@ -181,6 +189,9 @@ TYPED_TEST(ControlContract, ComboBoxKeyHandlerCanDiscardKeys) {
     this->b.type(box, "\bz");
     EXPECT_EQ(box.text(), "abz");
     EXPECT_EQ(keys, (std::vector<int>{'a', 'b', 'c', 'd', 'e', 8, 'z'}));
+    this->b.selectAll(box);  // a key typed over the selection replaces it
+    this->b.type(box, "q");
+    EXPECT_EQ(box.text(), "q");
     box.setText("assigned by code, past any limit");
     EXPECT_EQ(box.text(), "assigned by code, past any limit");
     EXPECT_EQ(box.itemCount(), 2);
@@ -260,20 +271,47 @@ TEST(MemoryMessageBoxes, AnUnscriptedBoxFailsTheTest) {
     EXPECT_EQ(platform.shown()[1].style, 4);
 }
 
-TEST(QtTextEntry, CharactersBeyondLatin1AreNeverTyped) {
+TEST(QtShortDate, IsAsciiDigitsInTheLocalesOrderNeverAMonthNameOrOtherDigits) {
+    const std::pair<const char*, const char*> cases[] = {
+        {"C", "06/12/2026"},     {"en_US", "12/6/26"},    {"de_DE", "06.12.26"},
+        {"ar_EG", "06/12/2026"}, {"fa_IR", "2026/12/06"}, {"bn_BD", "06/12/2026"},
+        {"mr_IN", "06/12/2026"}, {"my_MM", "06-12-2026"}, {"ko_KR", "26. 12. 6."}};
+    for (const auto& [name, shown] : cases) {
+        EXPECT_EQ(qt::numericDate(QLocale(QString::fromLatin1(name)), QDate(2026, 12, 6)), shown)
+            << name;
+    }
+    // The program's own date under the locale this runs in; ctest runs it under C and fa_IR too.
+    const std::string today = qt::QtPlatform().shortDate();
+    EXPECT_EQ(today.find_first_not_of("0123456789/.- "), std::string::npos) << today;
+}
+
+TEST(QtTextEntry, TextTheFilesCannotHoldIsRefusedWholeWithABeep) {
     QtBackend b;
     ui::TextBox& box = b.text();
     ui::ComboBox& combo = b.combo();
     combo.setText("");
-    typeText(b.widgetOf.at(&box), QString::fromUtf8("a\xE2\x82\xAC\xC3\xA9"));  // a, euro, e-acute
-    EXPECT_EQ(box.text(), "a\xE9");
-    typeText(b.widgetOf.at(&combo), QString::fromUtf8("b\xE2\x82\xAC\xC3\xB1"));
-    EXPECT_EQ(combo.text(), "b\xF1");
-    // Pasted text goes through the same validator.
+    int beeps = 0;
+    qt::setRefusalHook([&] { ++beeps; });
     auto* edit = static_cast<QLineEdit*>(b.widgetOf.at(&box));
-    edit->clear();
-    edit->insert(QString::fromUtf8("x\xE2\x82\xAC"));
-    EXPECT_EQ(box.text(), "");
+    // a, euro, e-acute typed: the euro alone is refused, each time with a beep.
+    typeText(edit, QString::fromUtf8("a\xE2\x82\xAC\xC3\xA9"));
+    typeText(b.widgetOf.at(&combo), QString::fromUtf8("b\xE2\x82\xAC\xC3\xB1"));
+    EXPECT_EQ(std::make_tuple(box.text(), combo.text(), beeps),
+              std::make_tuple("a\xE9", "b\xF1", 2));
+    // Pasted text holding a euro sign or a line break is refused whole; Latin-1 gets in.
+    for (const char* pasted : {"x\xE2\x82\xACy", "two\r\nlines", "\xC3\xA4\xC3\x98\xC3\x9F"}) {
+        QApplication::clipboard()->setText(QString::fromUtf8(pasted));
+        edit->paste();
+    }
+    EXPECT_EQ(std::make_tuple(box.text(), beeps), std::make_tuple("a\xE9\xE4\xD8\xDF", 4));
+    // A control character the program put there does not stop further typing.
+    box.setText("tab\there");
+    combo.setText("tab\there");
+    typeText(edit, "!");
+    typeText(b.widgetOf.at(&combo), "!");
+    EXPECT_EQ(std::make_tuple(box.text(), combo.text(), beeps),
+              std::make_tuple("tab\there!", "tab\there!", 4));
+    qt::setRefusalHook(nullptr);
 }
 
 }  // namespace

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <filesystem>
 #include <stdexcept>
+#include <utility>
 
 #include "catalogue/latin1.h"
 
@@ -95,6 +96,7 @@ std::string MemoryComboBox::itemText(int index) const {
 bool MemoryComboBox::setText(const std::string& text) {
     if (pickOnly_ && std::find(items_.begin(), items_.end(), text) == items_.end()) return false;
     text_ = text;
+    allSelected_ = false;
     return true;
 }
 
@@ -104,6 +106,10 @@ void MemoryComboBox::type(const std::string& keys) {
         int key = c;
         if (onKeyPress) onKeyPress(key);
         if (key == 0) continue;
+        if (std::exchange(allSelected_, false)) {
+            text_.clear();
+            if (key == 8) continue;
+        }
         if (key == 8) {
             if (!text_.empty()) text_.pop_back();
         } else {
@@ -115,6 +121,7 @@ void MemoryComboBox::type(const std::string& keys) {
 bool MemoryComboBox::userPick(int index) {
     if (!acceptsInput() || index < 0 || index >= itemCount()) return false;
     text_ = items_[static_cast<std::size_t>(index)];
+    allSelected_ = false;
     return true;
 }
 

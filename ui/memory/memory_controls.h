@@ -104,16 +104,21 @@ class MemoryComboBox : public ComboBox, public Owned {
     std::string itemText(int index) const override;
     std::string text() const override { return text_; }
     bool setText(const std::string& text) override;
+    std::size_t selectedLength() const override { return allSelected_ ? text_.size() : 0; }
     void setEnabled(bool enabled) override { ownEnabled_ = enabled; }
     bool isEnabled() const override { return ownEnabled_; }
 
-    // The user types these characters one by one, each through onKeyPress ('\b' deletes).
+    // The user types these characters one by one, each through onKeyPress ('\b' deletes); the
+    // first key that gets through replaces a selected text.
     void type(const std::string& keys);
+    // The user selects the whole text.
+    void userSelectAll() { allSelected_ = true; }
     // The user picks an item from the drop-down list.
     bool userPick(int index);
 
   private:
     bool pickOnly_;
+    bool allSelected_ = false;
     std::vector<std::string> items_;
     std::string text_;
 };

@@ -1,5 +1,6 @@
 #include "ui/qt/qt_controls.h"
 
+#include <QApplication>
 #include <QCheckBox>
 #include <QCloseEvent>
 #include <QComboBox>
@@ -23,6 +24,26 @@ bool lessItem(const std::string& a, const std::string& b) {
     return catalogue::itemLess(a, b);
 }
 
+std::function<void()>& refusalHook() {
+    static std::function<void()> hook;
+    return hook;
+}
+
+void refuseInput() {
+    if (refusalHook()) {
+        refusalHook()();
+    } else {
+        QApplication::beep();
+    }
+}
+
+qsizetype controlCharacters(const QString& text) {
+    return std::count_if(text.begin(), text.end(), [](QChar c) {
+        const char16_t u = c.unicode();
+        return u < 0x20 || (u >= 0x7F && u <= 0x9F);
+    });
+}
+
 }  // namespace
 
 QString toQt(const std::string& latin1) {
@@ -34,10 +55,18 @@ std::string fromQt(const QString& text) {
     return std::string(bytes.constData(), static_cast<std::size_t>(bytes.size()));
 }
 
-QValidator::State Latin1Validator::validate(QString& input, int& /*pos*/) const {
-    for (QChar c : input) {
-        if (c.unicode() > 0xFF) return Invalid;
+void setRefusalHook(std::function<void()> hook) {
+    refusalHook() = std::move(hook);
+}
+
+QValidator::State StorableTextValidator::validate(QString& input, int& /*pos*/) const {
+    const bool beyondLatin1 =
+        std::any_of(input.begin(), input.end(), [](QChar c) { return c.unicode() > 0xFF; });
+    if (beyondLatin1 || controlCharacters(input) > controlCharacters(last_)) {
+        refuseInput();
+        return Invalid;
     }
+    last_ = input;
     return Acceptable;
 }
 
@@ -243,7 +272,8 @@ QtComboBox::QtComboBox(QComboBox* combo) : combo_(combo) {
     combo_->setMaxVisibleItems(12);
     if (combo_->isEditable()) {
         combo_->setCompleter(nullptr);  // typing shows exactly what was typed
-        combo_->setValidator(new Latin1Validator(combo_));
+        validator_ = new StorableTextValidator(combo_);
+        combo_->setValidator(validator_);
     }
     // Keys are filtered on the combo box itself: its line edit forwards key presses to it.
     combo_->installEventFilter(this);
@@ -259,7 +289,10 @@ void QtComboBox::setItems(std::vector<std::string> items) {
     for (const auto& item : items) texts.append(toQt(item));
     combo_->clear();
     combo_->addItems(texts);
-    if (combo_->isEditable()) combo_->setEditText(keep);
+    if (combo_->isEditable()) {
+        if (validator_ != nullptr) validator_->setBaseline(keep);
+        combo_->setEditText(keep);
+    }
 }
 
 int QtComboBox::itemCount() const {
@@ -276,6 +309,10 @@ std::string QtComboBox::text() const {
 
 bool QtComboBox::setText(const std::string& text) {
     if (combo_->isEditable()) {
+        // No item is current afterwards, so Down in the box starts again at the first item
+        // rather than after the one last picked.
+        combo_->setCurrentIndex(-1);
+        if (validator_ != nullptr) validator_->setBaseline(toQt(text));
         combo_->setEditText(toQt(text));
         return true;
     }
@@ -283,6 +320,11 @@ bool QtComboBox::setText(const std::string& text) {
     if (index < 0) return false;
     combo_->setCurrentIndex(index);
     return true;
+}
+
+std::size_t QtComboBox::selectedLength() const {
+    const QLineEdit* edit = combo_->lineEdit();
+    return edit == nullptr ? 0 : static_cast<std::size_t>(edit->selectedText().size());
 }
 
 void QtComboBox::setEnabled(bool enabled) {
@@ -303,7 +345,10 @@ bool QtComboBox::eventFilter(QObject* watched, QEvent* event) {
         key = 8;
     } else if (!keyEvent->text().isEmpty() && keyEvent->text().at(0).isPrint()) {
         const char16_t code = keyEvent->text().at(0).unicode();
-        if (code > 0xFF) return true;  // not a Latin-1 character: never typed
+        if (code > 0xFF) {
+            refuseInput();  // not a Latin-1 character: never typed
+            return true;
+        }
         key = code;
     } else {
         return false;  // navigation and editing keys are not characters
@@ -312,8 +357,8 @@ bool QtComboBox::eventFilter(QObject* watched, QEvent* event) {
     return key == 0;
 }
 
-QtTextBox::QtTextBox(QLineEdit* edit) : edit_(edit) {
-    edit_->setValidator(new Latin1Validator(edit_));
+QtTextBox::QtTextBox(QLineEdit* edit) : edit_(edit), validator_(new StorableTextValidator(edit)) {
+    edit_->setValidator(validator_);
 }
 
 std::string QtTextBox::text() const {
@@ -324,6 +369,7 @@ void QtTextBox::setText(const std::string& text) {
     // Text set by the program is kept whole even beyond the typing limit.
     edit_->setMaxLength(
         std::max<int>({limit_ > 0 ? limit_ : 32767, static_cast<int>(text.size())}));
+    validator_->setBaseline(toQt(text));
     edit_->setText(toQt(text));
 }
 

@@ -2,6 +2,7 @@
 
 #include <QObject>
 #include <QValidator>
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -16,18 +17,29 @@ class QPushButton;
 class QWidget;
 
 // The window controls on Qt Widgets. Each adapter wraps a widget that the window's view owns;
-// text crosses as Latin-1 bytes, and characters beyond Latin-1 cannot be typed or pasted.
+// text crosses as Latin-1 bytes, and characters the files cannot hold are never typed or pasted.
 namespace ui::qt {
 
 QString toQt(const std::string& latin1);
 std::string fromQt(const QString& text);
 
-// Refuses any character above U+00FF.
-class Latin1Validator : public QValidator {
+// Refuses, with a beep, an edit that brings in a character the catalogue's files cannot hold: one
+// beyond Latin-1, or a control character (a CR would even split a record's line). Text set by the
+// program is taken as it is; control characters it already holds do not stop later edits.
+class StorableTextValidator : public QValidator {
   public:
     using QValidator::QValidator;
     State validate(QString& input, int& pos) const override;
+    // The text the program is about to set.
+    void setBaseline(const QString& text) { last_ = text; }
+
+  private:
+    mutable QString last_;
 };
+
+// What sounds when typed, pasted or dropped text is refused: the system beep, or for tests
+// `hook` (nullptr puts the beep back).
+void setRefusalHook(std::function<void()> hook);
 
 // A top-level window. Its first show() runs onLoad; every closing (close box or unload())
 // runs onUnload. A disabled window ignores its close box.
@@ -108,6 +120,7 @@ class QtComboBox : public QObject, public ComboBox {
     std::string itemText(int index) const override;
     std::string text() const override;
     bool setText(const std::string& text) override;
+    std::size_t selectedLength() const override;
     void setEnabled(bool enabled) override;
     bool isEnabled() const override;
 
@@ -116,6 +129,7 @@ class QtComboBox : public QObject, public ComboBox {
 
   private:
     QComboBox* combo_;
+    StorableTextValidator* validator_ = nullptr;
 };
 
 class QtTextBox : public TextBox {
@@ -131,6 +145,7 @@ class QtTextBox : public TextBox {
   private:
     void applyLimit();
     QLineEdit* edit_;
+    StorableTextValidator* validator_;
     int limit_ = 0;
 };
 

@@ -8,7 +8,15 @@ class QComboBox;
 class QFileSystemModel;
 class QTreeView;
 
+class QString;
+
+// Folders cross to the window logic as the file system's own bytes, never as Latin-1 text: any
+// folder the system can name is shown decoded and handed back byte for byte.
 namespace ui::qt {
+
+// The text of file-system bytes, and the bytes of a text, as the toolkit encodes file names.
+QString fromFileSystem(const std::string& bytes);
+std::string toFileSystem(const QString& name);
 
 // The mounted volumes, as a pick-only combo box. onChange fires for the user and for code.
 class QtDriveList : public DriveList {

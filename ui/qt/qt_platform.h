@@ -4,6 +4,8 @@
 
 #include "ui/platform.h"
 
+class QDate;
+class QLocale;
 class QMessageBox;
 
 namespace ui::qt {
@@ -31,5 +33,10 @@ class QtPlatform : public Platform {
     bool ended_ = false;
     int status_ = 0;
 };
+
+// The date as the report prints it: the locale's short date when that is ASCII digits and marks;
+// otherwise day, month and year as ASCII digits in the locale's order ("06/12/2026"), or
+// "2026-12-06" when the locale's order cannot be told. Never a month name, never other digits.
+std::string numericDate(const QLocale& locale, const QDate& date);
 
 }  // namespace ui::qt

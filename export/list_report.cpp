@@ -1,0 +1,90 @@
+#include "export/list_report.h"
+
+#include "catalogue/catalogue_error.h"
+#include "catalogue/csv.h"
+#include "catalogue/file_names.h"
+#include "catalogue/file_text.h"
+#include "catalogue/latin1.h"
+#include "catalogue/records.h"
+#include "export/form_export.h"
+#include "export/html_page.h"
+#include "export/last_added.h"
+#include "export/report_table.h"
+#include "export/title_index.h"
+
+namespace exporting {
+
+std::vector<std::string> listTitles(catalogue::Store& store, const std::string& list) {
+    const std::string file = catalogue::entryFile(list);
+    std::optional<std::vector<std::string>> titles = catalogue::entryTitles(store.readBytes(file));
+    if (!titles) throw catalogue::CatalogueError(file, "the file ends inside an entry");
+    catalogue::sortItems(*titles);
+    return std::move(*titles);
+}
+
+ListReport buildListReport(catalogue::Store& store, const std::string& list,
+                           const std::vector<std::string>& titles, const ReportChoices& choices,
+                           std::string_view date) {
+    ListReport result;
+    // Lists made by older copies may have no flag file; the main window shows them with the
+    // information column, and so does the report.
+    const std::string flagFile = catalogue::flagFile(list);
+    result.flag = store.exists(flagFile) ? store.readNumber(flagFile) : std::optional<long>(1);
+    result.information = result.flag == 1 || (result.flag != 0 && !choices.noInformation);
+
+    const std::string entries = store.readText(catalogue::entryFile(list));
+    const std::string articles =
+        choices.articleNumbers ? store.readText(catalogue::articleFile(list)) : std::string();
+
+    ReportOptions options;
+    options.articleNumbers = choices.articleNumbers;
+    options.information = result.information;
+    options.date = choices.date;
+    options.separatorLines = choices.separatorLines;
+    options.counter = choices.counter;
+    std::string report = BuildReportTable(list, entries, articles, titles, options,
+                                          choices.date ? date : std::string_view());
+
+    // The top text is optional: a file that is missing or cannot be read is simply left out.
+    try {
+        if (auto top = store.readTextIfExists(catalogue::fileSystemName(list) + ".top"))
+            report.insert(0, *top);
+    } catch (const catalogue::CatalogueError&) {
+    }
+
+    LastAddedRequest request;
+    request.include = choices.lastAdded;
+    request.amountText = choices.amountText;
+    request.position = choices.position;
+    request.information = options.information;
+    request.titleCount = titles.size();
+    LastAddedResult withSection = BuildLastAdded(entries, std::move(report), request);
+    result.lastAddedRefused = withSection.refused;
+    result.text = std::move(withSection.report);
+    result.text.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
+    return result;
+}
+
+std::string reportFileBytes(const std::string& list, const std::string& report, bool html) {
+    return html ? HtmlPage(list, report) : report + "\r\n";
+}
+
+std::string listCsv(catalogue::Store& store, const std::string& list) {
+    const std::vector<std::string> titles = listTitles(store, list);
+    const std::string entryText = store.readText(catalogue::entryFile(list));
+    const std::string articleText = store.readText(catalogue::articleFile(list));
+    const EntryIndex entries(entryText);
+    const ArticleIndex articles(articleText);
+    std::string csv =
+        catalogue::csvRow({"title", "type", "discs", "information", "article number"});
+    csv.reserve(entryText.size() + articleText.size());
+    for (const std::string& title : titles) {
+        const Fields fields = entries.find(title);
+        csv += catalogue::latin1ToUtf8(catalogue::csvRow(
+            {title, std::string(fields.type), std::string(fields.discs),
+             std::string(fields.information), std::string(articles.find(title))}));
+    }
+    return csv;
+}
+
+}  // namespace exporting
