@@ -46,14 +46,14 @@ if [ "${PEMLA_SHOTS_STAGE:-}" = "display" ]; then
     keys() { xdotool key --delay 80 "$@"; sleep 0.4; }
 
     # The lists are sorted: Films, Jeux vidéo, Musique. The focus starts in the title box; a
-    # list box starts with its first row current but not selected. Open Films (two back from the
-    # title box), pick "Les Misérables" in the titles.
-    keys shift+Tab shift+Tab Down Up
-    keys Tab Down Down Down Down
+    # list box starts with its first row current but not selected. Open Films (three back from the
+    # title box, past the titles and the find box), pick "Les Misérables" in the titles.
+    keys shift+Tab shift+Tab shift+Tab Down Up
+    keys Tab Tab Down Down Down Down
     shot "$main" "${variant}main-window"
 
     # The list without an information column, with its longest title selected.
-    keys shift+Tab Down Tab Down
+    keys shift+Tab shift+Tab Down Tab Tab Down
     shot "$main" "${variant}main-window-no-information"
 
     # The same window filling the screen.
@@ -61,7 +61,7 @@ if [ "${PEMLA_SHOTS_STAGE:-}" = "display" ]; then
     shot "$main" "${variant}main-window-maximised"
 
     # Back to Films for the dialogs, opened and closed by their access keys.
-    keys shift+Tab Up
+    keys shift+Tab shift+Tab Up
     keys alt+n
     dialog=$(window "Create new list")
     typeText "$dialog" "Séries télé"
