@@ -17,7 +17,9 @@ bool isPortableName(std::string_view name);
 
 // Tries `name` + ".del" as a file of the store's folder: a portable name whose probe file can be
 // created exclusively and removed again is usable. A probe file that is already there proves the
-// name usable and is never touched. False on any refusal; never throws for the name's sake.
+// name usable and is never touched. The probe is recorded before it is made, so a start after a
+// kill removes it. False on any refusal; throws CatalogueError only when the record cannot be
+// written (a pending change that cannot be finished, a folder that takes no file).
 bool probeFileName(Store& store, std::string_view name);
 
 }  // namespace catalogue

@@ -19,14 +19,36 @@ namespace {
 
 const std::string kJournalTemp = std::string(kJournalName) + std::string(kTempSuffix);
 
-// Reads a whole file through `sys`; errors name `shown`.
-std::string readAll(Sys& sys, const std::string& fullPath, const std::string& shown) {
-    const int fd = sys.open(fullPath, O_RDONLY, 0);
+FileStamp stampFrom(const struct stat& st) {
+    FileStamp stamp;
+    stamp.exists = true;
+    stamp.device = st.st_dev;
+    stamp.inode = st.st_ino;
+    stamp.size = st.st_size;
+    stamp.modified = st.st_mtim;
+    return stamp;
+}
+
+// Reads a whole regular file through `sys`; errors name `shown`. The descriptor is opened without
+// blocking and checked before the first read, so a FIFO or a device never stalls the program.
+std::string readAll(Sys& sys, const std::string& fullPath, const std::string& shown,
+                    FileStamp* stamp = nullptr) {
+    const int fd = sys.open(fullPath, O_RDONLY | O_NONBLOCK, 0);
     if (fd < 0) throw osError(shown, errno);
-    std::string bytes;
     struct stat st {};
-    if (::fstat(fd, &st) == 0 && S_ISREG(st.st_mode))
-        bytes.reserve(static_cast<size_t>(st.st_size));
+    if (::fstat(fd, &st) != 0) {
+        const int err = errno;
+        sys.close(fd);
+        throw osError(shown, err);
+    }
+    if (!S_ISREG(st.st_mode)) {
+        sys.close(fd);
+        if (S_ISDIR(st.st_mode)) throw osError(shown, EISDIR);
+        throw CatalogueError(shown, "it is a FIFO or a device, not a file");
+    }
+    if (stamp != nullptr) *stamp = stampFrom(st);
+    std::string bytes;
+    bytes.reserve(static_cast<size_t>(st.st_size));
     char buffer[65536];
     for (;;) {
         const ssize_t got = sys.read(fd, buffer, sizeof buffer);
@@ -55,10 +77,14 @@ std::string folderOf(const std::string& path) {
     return path.substr(0, slash);
 }
 
+// Writes a staged file. `keepMode` gives it the permission bits of the file it will replace; a
+// file system that keeps no such bits may refuse them, which is no error. Without `durable` the
+// data is not flushed: for records that only a killed process needs.
 void writeAll(Sys& sys, const std::string& fullPath, const std::string& shown,
-              std::string_view bytes) {
-    const int fd = sys.open(fullPath, O_WRONLY | O_CREAT | O_TRUNC, 0666);
+              std::string_view bytes, const mode_t* keepMode = nullptr, bool durable = true) {
+    const int fd = sys.open(fullPath, O_WRONLY | O_CREAT | O_TRUNC | O_NONBLOCK, 0666);
     if (fd < 0) throw osError(shown, errno);
+    if (keepMode != nullptr) (void)::fchmod(fd, *keepMode);
     std::size_t done = 0;
     while (done < bytes.size()) {
         const ssize_t wrote = sys.write(fd, bytes.data() + done, bytes.size() - done);
@@ -71,7 +97,7 @@ void writeAll(Sys& sys, const std::string& fullPath, const std::string& shown,
         }
         done += static_cast<std::size_t>(wrote);
     }
-    if (sys.fsync(fd) != 0) {
+    if (durable && sys.fsync(fd) != 0) {
         const int err = errno;
         sys.close(fd);
         sys.unlink(fullPath);
@@ -95,6 +121,22 @@ void syncDirectory(Sys& sys, const std::string& folder, const std::string& shown
     sys.close(fd);
 }
 
+// The permission bits of a regular file about to be replaced, to give its successor.
+std::optional<mode_t> modeOf(const std::string& fullPath) {
+    struct stat st {};
+    if (::stat(fullPath.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return std::nullopt;
+    return st.st_mode & 07777;
+}
+
+// A complete journal that cannot be carried out blocks every later write: it says so, naming
+// the journal and what failed.
+CatalogueError stuckJournal(const CatalogueError& cause) {
+    return CatalogueError(std::string(kJournalName),
+                          "an earlier change recorded in it could not be finished (" +
+                              cause.file() + ": " + cause.reason() +
+                              "), so nothing else is written until it is");
+}
+
 // A file with every write permission bit cleared is one the user protected: it is neither
 // replaced nor deleted, even where the process could (as root, or by renaming over it).
 void refuseProtected(const std::string& fullPath, const std::string& shown) {
@@ -106,16 +148,27 @@ void refuseProtected(const std::string& fullPath, const std::string& shown) {
 
 // A target that the rename or unlink after the commit point would fail on (a folder, a name the
 // system refuses) could never be finished by any recovery: it is refused while nothing changed.
-void refuseUnreplaceable(const std::string& fullPath, const std::string& shown) {
+void refuseUnreplaceable(const std::string& fullPath, const std::string& shown, bool replacing) {
     struct stat st {};
     if (::lstat(fullPath.c_str(), &st) != 0) {
         if (errno != ENOENT) throw osError(shown, errno);
         return;
     }
     if (S_ISDIR(st.st_mode)) throw osError(shown, EISDIR);
+    // Nor is a FIFO or a device that the user put in a file's place replaced by a file.
+    if (replacing && !S_ISREG(st.st_mode) && !S_ISLNK(st.st_mode)) {
+        throw CatalogueError(shown, "it is a FIFO or a device, not a file");
+    }
 }
 
 }  // namespace
+
+bool FileStamp::operator==(const FileStamp& other) const {
+    if (exists != other.exists) return false;
+    return !exists ||
+           (device == other.device && inode == other.inode && size == other.size &&
+            modified.tv_sec == other.modified.tv_sec && modified.tv_nsec == other.modified.tv_nsec);
+}
 
 Store::Store(std::string folder, Sys& sys) : folder_(std::move(folder)), sys_(sys) {
     if (folder_.empty()) folder_ = ".";
@@ -134,8 +187,8 @@ std::string Store::path(std::string_view name) const {
     return full;
 }
 
-std::string Store::readBytes(const std::string& name) {
-    return readAll(sys_, path(name), name);
+std::string Store::readBytes(const std::string& name, FileStamp* stamp) {
+    return readAll(sys_, path(name), name, stamp);
 }
 
 std::string Store::readText(const std::string& name) {
@@ -164,9 +217,16 @@ bool Store::exists(const std::string& name) const {
     return ::stat(path(name).c_str(), &st) == 0;
 }
 
+FileStamp Store::stampOf(const std::string& name) const {
+    struct stat st {};
+    if (::stat(path(name).c_str(), &st) == 0) return stampFrom(st);
+    if (errno == ENOENT) return {};
+    throw osError(name, errno);
+}
+
 void Store::writeDurable(const std::string& fullPath, const std::string& shownName,
-                         std::string_view bytes) {
-    writeAll(sys_, fullPath, shownName, bytes);
+                         std::string_view bytes, const mode_t* keepMode) {
+    writeAll(sys_, fullPath, shownName, bytes, keepMode);
 }
 
 void Store::syncFolder() {
@@ -178,42 +238,127 @@ std::string Store::tempName(const std::string& name) {
            std::string(kTempSuffix);
 }
 
-void Store::apply(const std::vector<std::pair<std::string, std::string>>& renames,
-                  const std::vector<std::string>& deletions) {
-    for (const auto& [staged, target] : renames) {
+void Store::apply(const JournalPlan& plan) {
+    for (const auto& [staged, target] : plan.renames) {
         if (sys_.rename(path(staged), path(target)) != 0) {
             // A staged file that is gone was renamed by an earlier, interrupted attempt.
             if (errno == ENOENT && !exists(staged)) continue;
             throw osError(target, errno);
         }
     }
-    for (const auto& target : deletions) {
+    for (const auto& target : plan.deletions) {
         if (sys_.unlink(path(target)) != 0 && errno != ENOENT) throw osError(target, errno);
     }
-    syncFolder();
+    // Strays hold nothing of the user's: one that cannot go now is no reason to keep the journal.
+    for (const auto& stray : plan.strays) sys_.unlink(stray.starts_with('/') ? stray : path(stray));
+    const bool changed = !plan.renames.empty() || !plan.deletions.empty();
+    if (changed) syncFolder();
     const std::string journal(kJournalName);
     if (sys_.unlink(path(journal)) != 0 && errno != ENOENT) throw osError(journal, errno);
-    syncFolder();
+    if (changed) syncFolder();
+}
+
+bool Store::settle() {
+    const std::string journal(kJournalName);
+    struct stat st {};
+    if (::lstat(path(journal).c_str(), &st) != 0 && errno == ENOENT) return false;
+    try {
+        // A journal that cannot be read now may still be complete: it stays, since dropping it
+        // could leave a half-applied change for good.
+        const std::optional<JournalPlan> plan =
+            decodeJournal(readAll(sys_, path(journal), journal));
+        if (plan) {
+            apply(*plan);
+            return !plan->renames.empty() || !plan->deletions.empty();
+        }
+        if (sys_.unlink(path(journal)) != 0 && errno != ENOENT) {
+            throw osError(journal, errno);
+        }
+        return false;
+    } catch (const CatalogueError& error) {
+        throw stuckJournal(error);
+    }
+}
+
+void Store::trySettle() {
+    try {
+        settle();
+    } catch (const CatalogueError&) {
+    }
 }
 
 void Store::recover() {
-    const std::string journal(kJournalName);
-    if (exists(journal)) {
-        // A journal that cannot be read now may still be complete: the error goes up and the
-        // journal stays, since dropping it could leave a half-applied change for good.
-        const std::optional<JournalPlan> plan = decodeJournal(readBytes(journal));
-        if (plan) {
-            apply(plan->renames, plan->deletions);
-        } else if (sys_.unlink(path(journal)) != 0 && errno != ENOENT) {
-            throw osError(journal, errno);
-        }
-    }
+    settle();
     // Whatever staged files remain belong to commits that never reached their journal.
     std::error_code ec;
     for (const auto& item : std::filesystem::directory_iterator(folder_, ec)) {
         const std::string name = item.path().filename().string();
         if (name.ends_with(kTempSuffix)) sys_.unlink(path(name));
     }
+}
+
+Transaction Store::begin() {
+    settle();
+    return Transaction(*this);
+}
+
+void Store::recordStrays(const std::vector<std::string>& paths) {
+    settle();
+    JournalPlan plan;
+    for (const std::string& stray : paths) {
+        if (!isStrayPath(stray)) throw CatalogueError(stray, "this is no short-lived file");
+        plan.strays.push_back(stray);
+    }
+    // No flush: the record only serves a process that is killed, whose written data the system
+    // keeps; after a power cut at worst a stray file is left.
+    const std::string journal(kJournalName);
+    try {
+        writeAll(sys_, path(kJournalTemp), journal, encodeJournal(plan), nullptr, false);
+        if (sys_.rename(path(kJournalTemp), path(journal)) != 0) throw osError(journal, errno);
+    } catch (const CatalogueError&) {
+        sys_.unlink(path(kJournalTemp));
+        throw;
+    }
+}
+
+void Store::clearStrays() {
+    // Tried twice; a record that stays is removed by the next operation or start.
+    const std::string journal = path(kJournalName);
+    if (sys_.unlink(journal) != 0 && errno != ENOENT) sys_.unlink(journal);
+}
+
+void Store::writeReport(const std::string& fullPath, std::string_view bytes) {
+    std::error_code ec;
+    std::filesystem::path absolute = std::filesystem::absolute(fullPath, ec);
+    const std::string target = ec ? fullPath : absolute.lexically_normal().string();
+    recordStrays({stagedPathOf(target)});
+    try {
+        writeFileAtomically(target, bytes, sys_);
+    } catch (const CatalogueError&) {
+        clearStrays();
+        throw;
+    }
+    clearStrays();
+}
+
+std::string Transaction::readText(const std::string& name) {
+    FileStamp stamp;
+    std::string text = toFileText(store_.readBytes(name, &stamp));
+    expected_.emplace_back(name, stamp);
+    return text;
+}
+
+std::optional<std::string> Transaction::readTextIfExists(const std::string& name) {
+    struct stat st {};
+    if (::lstat(store_.path(name).c_str(), &st) != 0 && errno == ENOENT) {
+        expected_.emplace_back(name, FileStamp{});
+        return std::nullopt;
+    }
+    return readText(name);
+}
+
+void Transaction::expect(const std::string& name, const FileStamp& stamp) {
+    expected_.emplace_back(name, stamp);
 }
 
 void Transaction::write(const std::string& name, std::string_view text) {
@@ -241,10 +386,16 @@ void Transaction::commit() {
     std::reverse(plan.begin(), plan.end());
 
     Store& s = store_;
-    s.recover();
+    s.settle();
+    // Checked as late as can be: what the operation was computed from must still be on disk.
+    for (const auto& [name, stamp] : expected_) {
+        if (!(s.stampOf(name) == stamp)) {
+            throw ChangedOnDisk(name, "it was changed on disk after it was read");
+        }
+    }
     for (const Action& action : plan) {
         refuseProtected(s.path(action.name), action.name);
-        refuseUnreplaceable(s.path(action.name), action.name);
+        refuseUnreplaceable(s.path(action.name), action.name, action.kind != Kind::Remove);
     }
 
     JournalPlan journal;
@@ -256,7 +407,9 @@ void Transaction::commit() {
             } else if (action.kind == Kind::Write) {
                 staged.push_back(s.tempName(action.name));
                 journal.renames.emplace_back(staged.back(), action.name);
-                s.writeDurable(s.path(staged.back()), action.name, action.bytes);
+                const std::optional<mode_t> mode = modeOf(s.path(action.name));
+                s.writeDurable(s.path(staged.back()), action.name, action.bytes,
+                               mode ? &*mode : nullptr);
             } else {
                 journal.deletions.push_back(action.name);
             }
@@ -310,20 +463,29 @@ void Transaction::commit() {
         if (s.sys_.unlink(s.path(journalName)) == 0) discard();
         throw;
     }
-    // Committed. A failure from here on is retried once; the journal stays for the next start
-    // if the retry fails as well.
+    // Committed. A failure from here on is retried once; should the retry fail as well, the
+    // journal stays and every later operation finishes it before anything else.
     try {
-        s.apply(journal.renames, journal.deletions);
+        s.apply(journal);
     } catch (const CatalogueError&) {
-        s.recover();
+        try {
+            s.settle();
+        } catch (const CatalogueError& again) {
+            throw UnfinishedChange(again.file(), again.reason());
+        }
     }
+}
+
+std::string stagedPathOf(const std::string& fullPath) {
+    return fullPath + "." + std::to_string(::getpid()) + std::string(kTempSuffix);
 }
 
 void writeFileAtomically(const std::string& fullPath, std::string_view bytes, Sys& sys) {
     const std::string shown = baseName(fullPath);
     refuseProtected(fullPath, shown);
-    // A staged copy of this file left by an earlier write that was stopped dead goes first; the
-    // output folder has no start-up recovery of its own.
+    const std::optional<mode_t> mode = modeOf(fullPath);
+    // A staged copy of this file left by an earlier write that was stopped dead, and whose
+    // record was lost with it (a power cut, an older build), goes first.
     std::error_code ec;
     for (const auto& item : std::filesystem::directory_iterator(folderOf(fullPath), ec)) {
         const std::string name = item.path().filename().string();
@@ -336,9 +498,8 @@ void writeFileAtomically(const std::string& fullPath, std::string_view bytes, Sy
             }
         }
     }
-    const std::string staged =
-        fullPath + "." + std::to_string(::getpid()) + std::string(kTempSuffix);
-    writeAll(sys, staged, shown, bytes);
+    const std::string staged = stagedPathOf(fullPath);
+    writeAll(sys, staged, shown, bytes, mode ? &*mode : nullptr);
     if (sys.rename(staged, fullPath) != 0) {
         const int err = errno;
         sys.unlink(staged);

@@ -66,6 +66,8 @@ Form_Export::Form_Export(const Form_ExportControls& controls, ui::Platform& plat
 
 void Form_Export::Form_Load() {
     form1_.controls().window.setEnabled(false);
+    // The hidden box follows the list of each run; it starts cleared at every opening.
+    c_.Check_noinfo.setValue(0);
     LoadSettings();
 }
 
@@ -188,8 +190,8 @@ void Form_Export::RunExport() {
             // The folder is the file system's bytes; the list name is converted to match them.
             const std::string out = folder + catalogue::fileSystemName(list);
             const bool html = c_.Checkhtml.value() == 1;
-            catalogue::writeFileAtomically(out + (html ? ".html" : ".TXT"),
-                                           reportFileBytes(list, report, html), store_.sys());
+            store_.writeReport(out + (html ? ".html" : ".TXT"),
+                               reportFileBytes(list, report, html));
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);
             form1_.showError(error.file(), error.reason());

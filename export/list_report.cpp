@@ -26,7 +26,10 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list,
                            const std::vector<std::string>& titles, const ReportChoices& choices,
                            std::string_view date) {
     ListReport result;
-    result.flag = store.readNumber(catalogue::flagFile(list));
+    // Lists made by older copies may have no flag file; the main window shows them with the
+    // information column, and so does the report.
+    const std::string flagFile = catalogue::flagFile(list);
+    result.flag = store.exists(flagFile) ? store.readNumber(flagFile) : std::optional<long>(1);
     result.information = result.flag == 1 || (result.flag != 0 && !choices.noInformation);
 
     const std::string entries = store.readText(catalogue::entryFile(list));

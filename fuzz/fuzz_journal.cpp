@@ -13,6 +13,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
                 std::abort();
             }
         }
+        for (const auto& stray : plan->strays) {
+            if (!catalogue::isStrayPath(stray)) std::abort();
+        }
         if (catalogue::encodeJournal(*plan) != bytes) std::abort();
     }
     return 0;

@@ -5,6 +5,7 @@
 #include "catalogue/catalogue_error.h"
 #include "catalogue/entry_rules.h"
 #include "catalogue/file_names.h"
+#include "catalogue/file_text.h"
 
 namespace main_window {
 
@@ -55,7 +56,30 @@ Form1::Form1(const Form1Controls& controls, ui::Platform& platform, catalogue::S
     c_.Command_delete.onClick = [this] { Command_delete_Click(); };
 }
 
+namespace {
+
+std::string absoluteFolder(const std::string& folder) {
+    std::error_code ec;
+    const std::filesystem::path full = std::filesystem::absolute(folder, ec);
+    return ec ? folder : full.lexically_normal().string();
+}
+
+}  // namespace
+
 void Form1::Form_Load() {
+    // Taken before anything is read or finished: a second copy must not touch a journal or a
+    // staged file of the copy that holds the folder.
+    lock_.reset();  // a window loaded again takes the lock again, not a second one beside it
+    lock_ = std::make_unique<catalogue::FolderLock>(store_.folder());
+    if (lock_->state() == catalogue::FolderLock::State::Taken) {
+        platform_.messageBox("Pemla is already running on the folder \"" +
+                                 catalogue::shownName(absoluteFolder(store_.folder())) +
+                                 "\". Use the window that is open there: a second copy could "
+                                 "undo its changes, so this one ends without changing anything.",
+                             ui::kCritical, "Error");
+        platform_.endProgram(3);
+        return;
+    }
     try {
         store_.recover();
         fillSuggestions("type.dat", c_.Combo1);
@@ -67,13 +91,10 @@ void Form1::Form_Load() {
         LoadListNames();
         return;
     } catch (const CatalogueError& error) {
-        std::error_code ec;
-        const std::string folder =
-            std::filesystem::absolute(store_.folder(), ec).lexically_normal();
         platform_.messageBox("Pemla cannot start: the file \"" +
                                  catalogue::shownName(error.file()) + "\" in the folder \"" +
-                                 catalogue::shownName(folder) + "\" cannot be used (" +
-                                 error.reason() + ").",
+                                 catalogue::shownName(absoluteFolder(store_.folder())) +
+                                 "\" cannot be used (" + error.reason() + ").",
                              ui::kCritical, "Error");
     }
     platform_.endProgram(1);
@@ -96,7 +117,10 @@ void Form1::LoadListNames() {
     wholeList_.clear();
     c_.List_list.clear();
     c_.List1.clear();
-    c_.List_list.setItems(store_.readLines(catalogue::kIndexFile));
+    const std::string index = store_.readBytes(catalogue::kIndexFile, &indexStamp_);
+    std::vector<std::string> names;
+    for (std::string_view line : catalogue::splitLines(index)) names.emplace_back(line);
+    c_.List_list.setItems(std::move(names));
 }
 
 void Form1::Command_create_Click() {
@@ -133,20 +157,75 @@ std::string Form1::selectedList() const {
     return name;
 }
 
-void Form1::guarded(const std::function<void()>& body) {
-    try {
-        body();
-    } catch (const CatalogueError& error) {
-        showError(error.file(), error.reason());
-    } catch (const Refusal& refusal) {
-        platform_.messageBox(refusal.prompt, ui::kCritical, "Error");
+namespace {
+
+std::string errorText(const std::string& file, const std::string& reason) {
+    return "The file \"" + catalogue::shownName(file) + "\" could not be used:\r\n" + reason + ".";
+}
+
+}  // namespace
+
+void Form1::guarded(const std::function<void()>& body, bool busy) {
+    std::string prompt;
+    bool stale = false;
+    {
+        std::optional<ui::BusyPointer> pointer;
+        if (busy) pointer.emplace(platform_);
+        try {
+            body();
+        } catch (const catalogue::ChangedOnDisk& error) {
+            prompt = error.file() == catalogue::kJournalName
+                         ? std::string(
+                               "An earlier change that was left unfinished has now been "
+                               "completed, so nothing else was done.")
+                         : "The file \"" + catalogue::shownName(error.file()) +
+                               "\" was changed on disk after this window read it, so nothing "
+                               "was written.";
+            prompt +=
+                "\r\nThe window now shows the files as they are; please make the change "
+                "again.";
+            stale = true;
+        } catch (const catalogue::UnfinishedChange& error) {
+            prompt = errorText(error.file(), error.reason()) +
+                     "\r\nThe window now shows the files as they are.";
+            stale = true;
+        } catch (const CatalogueError& error) {
+            prompt = errorText(error.file(), error.reason());
+        } catch (const Refusal& refusal) {
+            prompt = refusal.prompt;
+        }
+    }
+    if (stale) showFilesAgain();
+    if (!prompt.empty()) platform_.messageBox(prompt, ui::kCritical, "Error");
+}
+
+void Form1::finishEarlierChange() {
+    if (store_.settle()) {
+        throw catalogue::ChangedOnDisk(std::string(catalogue::kJournalName), "it was finished");
     }
 }
 
+void Form1::showFilesAgain() {
+    const std::string list = selectedList();
+    const std::optional<std::string> title = selectedTitle();
+    const std::string information = c_.Combo3.text();
+    store_.trySettle();
+    guarded([&] {
+        LoadListNames();
+        for (int i = 0; i < c_.List_list.count(); ++i) {
+            if (c_.List_list.itemText(i) != list) continue;
+            c_.List_list.setSelected(i, true);
+            LoadEntries(list);
+            for (int j = 0; title && j < c_.List1.count(); ++j) {
+                if (c_.List1.itemText(j) == *title) c_.List1.setSelected(j, true);
+            }
+        }
+    });
+    c_.Combo3.setText(information);
+}
+
 void Form1::showError(const std::string& file, const std::string& reason) {
-    platform_.messageBox(
-        "The file \"" + catalogue::shownName(file) + "\" could not be used:\r\n" + reason + ".",
-        ui::kCritical, "Error");
+    platform_.messageBox(errorText(file, reason), ui::kCritical, "Error");
 }
 
 }  // namespace main_window

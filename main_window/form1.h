@@ -1,9 +1,11 @@
 #pragma once
 
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 
+#include "catalogue/folder_lock.h"
 #include "catalogue/records.h"
 #include "catalogue/store.h"
 #include "ui/controls.h"
@@ -58,8 +60,10 @@ class Form1 {
     ui::Platform& platform() { return platform_; }
     catalogue::Store& store() { return store_; }
 
-    // Start-up: finishes an interrupted save, fills the suggestion boxes and the lists. On a
-    // failure it says which file is missing in which folder and ends the program with status 1.
+    // Start-up: locks the folder, finishes an interrupted save, fills the suggestion boxes and
+    // the lists. On a failure it says which file cannot be used in which folder and ends the
+    // program with status 1; when another copy holds the folder it says so, naming the folder,
+    // and ends with status 3. Either way nothing is written.
     void Form_Load();
     // Closing the window unloads the export dialog, then the new-list dialog (and the search).
     void Form_Unload();
@@ -92,8 +96,13 @@ class Form1 {
     void Command_delentry_Click();
     void Command_delete_Click();
 
-    // Plans the next article number for a title's first character in the list's counter file
-    // and sets ArticleNumber. Refuses (nothing planned) when the letter's numbers are used up.
+    // Whether a list has the information column: lists made by older copies may have no flag
+    // file, and they have it. Throws CatalogueError when the flag file cannot be read.
+    bool HasInformation(const std::string& list);
+
+    // Plans the next article number for a title's first character in the list's counter file,
+    // read within `t`, and sets ArticleNumber. Refuses (nothing planned) when the letter's
+    // numbers are used up.
     void NextArticleNumber(char firstCharacter, const std::string& list, catalogue::Transaction& t);
     // Plans the empty-list skeleton for a list's entry, article and counter files.
     static void WriteEmptyList(const std::string& name, catalogue::Transaction& t);
@@ -106,9 +115,12 @@ class Form1 {
         std::string prompt;
     };
 
-    // Runs a handler body; a catalogue failure is shown as a message naming the file and the
-    // reason, a Refusal as its prompt, and the window stays usable.
-    void guarded(const std::function<void()>& body);
+    // Runs a handler body, with the busy pointer when asked; a catalogue failure is shown as a
+    // message naming the file and the reason, a Refusal as its prompt, and the window stays
+    // usable. When the files on disk are no longer the ones the window shows (changed behind its
+    // back, or a change left unfinished), the window shows them again as they are now. The busy
+    // pointer is off before any message shows.
+    void guarded(const std::function<void()>& body, bool busy = false);
     // Shows a catalogue failure the way every handler does.
     void showError(const std::string& file, const std::string& reason);
 
@@ -126,9 +138,17 @@ class Form1 {
     std::optional<std::string> selectedTitle() const;
     // Refuses to write `list`'s entry file unless ListText came whole from it.
     void requireWholeList(const std::string& list) const;
+    // Reads the lists and the open list again, keeping the selections and the typed fields.
+    void showFilesAgain();
+    // Every change starts here: a change left unfinished is finished first, and when that moved
+    // files the window shows is refused (ChangedOnDisk naming the journal) and shows them again.
+    void finishEarlierChange();
 
     // The list whose entry file ListText holds whole; empty after a failed or no load.
     std::string wholeList_;
+    // The entry file and the index as they were read, for the writes computed from them.
+    catalogue::FileStamp listStamp_, indexStamp_;
+    std::unique_ptr<catalogue::FolderLock> lock_;
 
     Form1Controls c_;
     ui::Platform& platform_;

@@ -41,7 +41,7 @@ void Form1::requireWholeList(const std::string& list) const {
 void Form1::NextArticleNumber(char firstCharacter, const std::string& list,
                               catalogue::Transaction& t) {
     const std::string file = catalogue::counterFile(list);
-    const std::string counter = store_.readText(file);
+    const std::string counter = t.readText(file);
     std::string refusal;
     std::optional<catalogue::ArticleNumberResult> next =
         catalogue::handOutNumber(counter, file, firstCharacter, refusal);
@@ -58,15 +58,18 @@ void Form1::WriteEmptyList(const std::string& name, catalogue::Transaction& t) {
 
 void Form1::Command_add_Click() {
     guarded([&] {
+        finishEarlierChange();
+        const std::string list = selectedList();
+        if (list.empty()) {
+            // Nothing to store the entry in: the fields keep what was typed for when a list is
+            // open.
+            throw Refusal{
+                "No list is open, so the title was not added. Select the list to add it "
+                "to, then press Add again."};
+        }
         const catalogue::Entry entry = fieldsAsEntry();
         if (catalogue::isDuplicateTitle(ListText, entry.title)) {
             platform_.messageBox(catalogue::kDuplicateTitle, ui::kCritical, "Error");
-            return;
-        }
-        const std::string list = selectedList();
-        if (list.empty()) {
-            // No list to store it in: the fields are cleared and nothing is written.
-            ResetEntryFields();
             return;
         }
         requireWholeList(list);
@@ -74,12 +77,12 @@ void Form1::Command_add_Click() {
             throw Refusal{catalogue::kListFull};
         }
         catalogue::Transaction t = store_.begin();
+        t.expect(catalogue::entryFile(list), listStamp_);
         const std::string newText = catalogue::appendEntry(ListText, entry);
         t.write(catalogue::entryFile(list), newText);
         NextArticleNumber(entry.title.front(), list, t);
         const std::string articleFile = catalogue::articleFile(list);
-        std::string articles =
-            catalogue::forWriting(store_.readTextIfExists(articleFile).value_or(""));
+        std::string articles = catalogue::forWriting(t.readTextIfExists(articleFile).value_or(""));
         articles += catalogue::articleLine(entry.title, ArticleNumber);
         t.write(articleFile, articles);
         t.commit();
@@ -98,6 +101,7 @@ void Form1::Command_change_Click() {
         return;
     }
     guarded([&] {
+        finishEarlierChange();
         const catalogue::Entry entry = fieldsAsEntry();
         if (platform_.messageBox("Are ya sure yo want to change selected entry?", ui::kYesNo,
                                  "Change item") != ui::Answer::Yes) {
@@ -116,10 +120,16 @@ void Form1::Command_change_Click() {
                                  "the entry \"" + *oldTitle + "\" is not in the file");
         }
         catalogue::Transaction t = store_.begin();
+        t.expect(catalogue::entryFile(list), listStamp_);
         const std::string articleFile = catalogue::articleFile(list);
-        const std::string articles = store_.readText(articleFile);
+        // A change that keeps the title needs the article file only to give a title that lacks
+        // its article line one; without the file it leaves articles alone.
+        const bool sameTitle = entry.title == *oldTitle;
+        const std::optional<std::string> articleText =
+            sameTitle ? t.readTextIfExists(articleFile) : t.readText(articleFile);
+        const std::string articles = articleText.value_or("");
         const bool hasLine = catalogue::findArticleLine(articles, *oldTitle) != std::string::npos;
-        if (entry.title != *oldTitle || !hasLine) {
+        if (articleText && (!sameTitle || !hasLine)) {
             if (!hasLine || upperFirst(entry.title) != upperFirst(*oldTitle)) {
                 NextArticleNumber(entry.title.front(), list, t);
                 std::string moved = catalogue::removeArticleLine(articles, *oldTitle);
@@ -151,7 +161,9 @@ void Form1::Command_delentry_Click() {
         return;
     }
     guarded([&] {
+        finishEarlierChange();
         catalogue::Transaction t = store_.begin();
+        if (wholeList_ == list) t.expect(catalogue::entryFile(list), listStamp_);
         if (c_.List1.count() == 1) {
             WriteEmptyList(list, t);
             t.commit();
@@ -167,7 +179,7 @@ void Form1::Command_delentry_Click() {
         }
         t.write(catalogue::entryFile(list), *newText);
         const std::string articleFile = catalogue::articleFile(list);
-        if (auto articles = store_.readTextIfExists(articleFile)) {
+        if (auto articles = t.readTextIfExists(articleFile)) {
             t.write(articleFile, catalogue::removeArticleLine(*articles, *title));
         }
         t.commit();
@@ -191,8 +203,12 @@ void Form1::Command_delete_Click() {
         return;
     }
     guarded([&] {
+        finishEarlierChange();
         catalogue::Transaction t = store_.begin();
-        std::string index = catalogue::forWriting(store_.readText(catalogue::kIndexFile));
+        // The window's picture of the lists, and of the list going when it is the open one.
+        t.expect(catalogue::kIndexFile, indexStamp_);
+        if (wholeList_ == name) t.expect(catalogue::entryFile(name), listStamp_);
+        std::string index = catalogue::forWriting(t.readText(catalogue::kIndexFile));
         // Files that are already missing are simply not there to delete.
         for (const std::string& file : {catalogue::entryFile(name), catalogue::counterFile(name),
                                         catalogue::articleFile(name), catalogue::flagFile(name)}) {

@@ -11,13 +11,20 @@ using catalogue::CatalogueError;
 void Form1::List_list_Click() {
     c_.List1.clear();
     ResetEntryFields();
-    ui::BusyPointer busy(platform_);
+    // A change left half-done is finished before the list is read, where that can be done now;
+    // otherwise the list shows its files as they are, and writes are refused until it is.
+    store_.trySettle();
     for (int i = 0; i < c_.List_list.count(); ++i) {
         if (c_.List_list.selected(i)) {
             const std::string name = c_.List_list.itemText(i);
-            guarded([&] { LoadEntries(name); });
+            guarded([&] { LoadEntries(name); }, true);
         }
     }
+}
+
+bool Form1::HasInformation(const std::string& list) {
+    const std::string flagFile = catalogue::flagFile(list);
+    return !store_.exists(flagFile) || store_.readNumber(flagFile) == 1;
 }
 
 void Form1::LoadEntries(const std::string& name) {
@@ -28,11 +35,9 @@ void Form1::LoadEntries(const std::string& name) {
     c_.Label2.setCaption(kNoAmount);
 
     const std::string entryFile = catalogue::entryFile(name);
-    const std::string bytes = store_.readBytes(entryFile);
+    const std::string bytes = store_.readBytes(entryFile, &listStamp_);
 
-    // Lists made by older copies may have no flag file; they have the information column.
-    const std::string flagFile = catalogue::flagFile(name);
-    const bool information = !store_.exists(flagFile) || store_.readNumber(flagFile) == 1;
+    const bool information = HasInformation(name);
     c_.Text1.setMaxLength(information ? 26 : 42);
     c_.Combo3.setEnabled(information);
     c_.Combo3.setText(information ? "Info" : "  ");
@@ -51,23 +56,25 @@ void Form1::LoadEntries(const std::string& name) {
 }
 
 void Form1::List1_Click() {
-    ui::BusyPointer busy(platform_);
-    c_.List_list.refresh();
-    const std::optional<std::string> title = selectedTitle();
-    if (!title) return;
-    c_.Text1.setText(*title);
-    if (const auto entry = catalogue::findEntry(ListText, *title)) {
-        c_.Combo1.setText(entry->type);
-        c_.Combo2.setText(entry->discs);
-        c_.Combo3.setText(entry->information);
-    }
-    const std::string list = selectedList();
-    if (list.empty()) return;
-    c_.Textart.setText("");
-    guarded([&] {
-        const std::string articles = store_.readText(catalogue::articleFile(list));
-        c_.Textart.setText(catalogue::findArticleNumber(articles, c_.Text1.text()).value_or(""));
-    });
+    guarded(
+        [&] {
+            c_.List_list.refresh();
+            const std::optional<std::string> title = selectedTitle();
+            if (!title) return;
+            c_.Text1.setText(*title);
+            if (const auto entry = catalogue::findEntry(ListText, *title)) {
+                c_.Combo1.setText(entry->type);
+                c_.Combo2.setText(entry->discs);
+                c_.Combo3.setText(entry->information);
+            }
+            const std::string list = selectedList();
+            if (list.empty()) return;
+            c_.Textart.setText("");
+            const std::string articles = store_.readText(catalogue::articleFile(list));
+            c_.Textart.setText(
+                catalogue::findArticleNumber(articles, c_.Text1.text()).value_or(""));
+        },
+        true);
 }
 
 void Form1::ResetEntryFields() {

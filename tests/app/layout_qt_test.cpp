@@ -19,14 +19,14 @@
 
 namespace {
 
+// Each with a folder of its own: a second program on a folder that one holds would refuse to start.
 struct Windows {
-    Windows() : program(folder(), platform) {
+    Windows() : program(filled(files), platform) {
         program.start();
         const auto music = program.mainWindow().List_list->findItems("Music", Qt::MatchExactly);
         program.mainWindow().List_list->setCurrentItem(music.front());  // opens the list
     }
-    static const std::string& folder() {
-        static test_support::TempFolder files;
+    static const std::string& filled(const test_support::TempFolder& files) {
         files.put("type.dat", "Types\r\nAn uncommonly long type of disc, longer than any box\r\n");
         files.put("information.dat", "Information\r\nOriginal\r\n");
         files.put("pemla.dat", "Music\r\n");
@@ -45,6 +45,7 @@ struct Windows {
                 program.searchDialog().widget(), program.exportDialog().widget()};
     }
 
+    test_support::TempFolder files;
     ui::qt::QtPlatform platform;
     app::Program program;
 };

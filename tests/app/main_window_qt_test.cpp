@@ -10,6 +10,7 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QMessageBox>
+#include <QProcess>
 #include <QPushButton>
 #include <QTest>
 #include <iostream>
@@ -53,8 +54,8 @@ void answerAll(ui::Answer answer) {
     });
 }
 
-TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
-    test_support::TempFolder folder;
+// The list "Music" holding "Zebra".
+void putMusic(const test_support::TempFolder& folder) {
     folder.put("type.dat", "Types\r\nMusic CD\r\nGame\r\n");
     folder.put("information.dat", "Information\r\nOriginal\r\n");
     folder.put("pemla.dat", "Music\r\n");
@@ -62,7 +63,11 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     folder.put("Music.art", "Zebra#*\\Z001\r\n");
     folder.put("Music.arn", "A#001\r\nZ#002\r\n");
     folder.put("Music.inf", " 1 \r\n");
+}
 
+TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
+    test_support::TempFolder folder;
+    putMusic(folder);
     QtMainWindow w(folder);
     w.view.controls().window.show();
     ASSERT_FALSE(w.platform.ended());
@@ -112,6 +117,38 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     EXPECT_EQ(w.view.List1->count(), 1);
     EXPECT_EQ(w.view.Text1->text(), QStringLiteral("Zebra"));  // the deleted entry stays shown
     ui::qt::QtPlatform::setAnswerHook(nullptr);
+}
+
+// The real program started a second time on the folder this window holds ends with its message
+// and status 3, writing nothing; this window then writes as before. The second copy runs on a
+// display of its own, where xdotool answers its "Error" box; `timeout` fails the test instead of
+// waiting for ever on a copy that opened its main window.
+TEST(MainWindowOnQt, ASecondRealCopyOnTheSameFolderEndsAndTheFirstStillWrites) {
+    test_support::TempFolder folder;
+    putMusic(folder);
+    QtMainWindow w(folder);
+    w.view.controls().window.show();
+    const std::string before = folder.listing() + folder.get("Music.dat") + folder.get("pemla.dat");
+    QProcess second;
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.remove(QStringLiteral("QT_QPA_PLATFORM"));
+    second.setProcessEnvironment(environment);
+    second.start(QStringLiteral("timeout"),
+                 {"60", "xvfb-run", "-a", "sh", "-c",
+                  "\"$0\" --data \"$1\" & id=$(timeout 30 xdotool search --sync --onlyvisible "
+                  "--name '^Error$' "
+                  "| head -n 1) && xdotool windowfocus --sync \"$id\" key Return; wait $!",
+                  PEMLA_BINARY, QString::fromStdString(folder.path())});
+    ASSERT_TRUE(second.waitForFinished(90000)) << "the second copy did not end";
+    EXPECT_EQ(second.exitStatus(), QProcess::NormalExit);
+    EXPECT_EQ(second.exitCode(), 3) << second.readAllStandardError().toStdString();
+    EXPECT_EQ(folder.listing() + folder.get("Music.dat") + folder.get("pemla.dat"), before);
+
+    w.select(w.view.List_list, QStringLiteral("Music"));
+    w.typeInto(w.view.Text1, QStringLiteral("Abbey Road"));
+    w.click(w.view.Command_add);
+    EXPECT_EQ(w.view.List1->count(), 2);
+    EXPECT_EQ(folder.get("Music.art"), "Zebra#*\\Z001\r\nAbbey Road#*\\A001\r\n");
 }
 
 TEST(MainWindowOnQt, TheLargestListOpensQuickly) {

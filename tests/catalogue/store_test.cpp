@@ -1,7 +1,10 @@
 #include "catalogue/store.h"
 
 #include <gtest/gtest.h>
+#include <signal.h>
 #include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
@@ -10,6 +13,7 @@
 #include <vector>
 
 #include "catalogue/catalogue_error.h"
+#include "catalogue/folder_lock.h"
 #include "catalogue/journal.h"
 #include "tests/support/faulty_sys.h"
 #include "tests/support/temp_folder.h"
@@ -132,7 +136,8 @@ TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFileOrKeepsTheOldOne) {
 
 const JournalPlan kPlan{{{"Rock.dat.1-1.pemla-tmp", "Rock.dat"},
                          {"Rock & Pop \xE9.art.1-2.pemla-tmp", "Rock & Pop \xE9.art"}},
-                        {"Rock.inf", "END 12"}};
+                        {"Rock.inf", "END 12"},
+                        {"Rock.del", "/out/Rock.TXT.77.pemla-tmp"}};
 
 TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
     const std::string bytes = encodeJournal(kPlan);
@@ -140,6 +145,7 @@ TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
     ASSERT_TRUE(plan);
     EXPECT_EQ(plan->renames, kPlan.renames);
     EXPECT_EQ(plan->deletions, kPlan.deletions);
+    EXPECT_EQ(plan->strays, kPlan.strays);
     for (std::size_t n = 0; n < bytes.size(); ++n) {
         EXPECT_FALSE(decodeJournal(bytes.substr(0, n))) << "prefix of " << n;
     }
@@ -154,12 +160,17 @@ TEST(Journal, RoundTripsAndReadsATornOrDamagedJournalAsNothing) {
     EXPECT_FALSE(decodeJournal(bytes + bytes));
 }
 
+// Strays, which are removed without a question, are probes or staged copies and nothing else.
 TEST(Journal, OnlyPlainNamesOfTheFolder) {
     for (const std::string& bad : std::vector<std::string>{"../Rock.dat", "/etc/passwd", "a/b", ".",
                                                            "..", std::string("a\0b", 3), ""}) {
-        EXPECT_FALSE(decodeJournal(encodeJournal({{{"x.pemla-tmp", bad}}, {}}))) << bad;
-        EXPECT_FALSE(decodeJournal(encodeJournal({{{bad, "x.dat"}}, {}}))) << bad;
-        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {bad}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{{"x.pemla-tmp", bad}}, {}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{{bad, "x.dat"}}, {}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {bad}, {}}))) << bad;
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {}, {bad}}))) << bad;
+    }
+    for (const char* bad : {"Rock.dat", "a.pemla-tmp", "/a/../b.pemla-tmp", "/x.del"}) {
+        EXPECT_FALSE(decodeJournal(encodeJournal({{}, {}, {bad}}))) << bad;
     }
 }
 
@@ -174,7 +185,7 @@ void putHalfDone(const TempFolder& folder, std::string_view journal) {
 }
 
 const std::string kHalfDone = encodeJournal(
-    {{{"a.dat.9-1.pemla-tmp", "a.dat"}, {"b.dat.9-2.pemla-tmp", "b.dat"}}, {"c.dat"}});
+    {{{"a.dat.9-1.pemla-tmp", "a.dat"}, {"b.dat.9-2.pemla-tmp", "b.dat"}}, {"c.dat"}, {}});
 
 TEST(Recovery, FinishesACompleteJournalAndDropsATornOneWithItsStagedFiles) {
     TempFolder done, torn;
@@ -204,6 +215,32 @@ TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
     }
     Store(folder.path()).recover();
     EXPECT_EQ(folder.get("b.dat"), "b new\r\n");
+}
+
+// The lock lives as long as the process holding it, however that process ends.
+TEST(FolderLock, HeldByOneProcessUntilItIsKilled) {
+    TempFolder folder;
+    int ready[2];
+    ASSERT_EQ(::pipe(ready), 0);
+    const pid_t holder = ::fork();
+    if (holder == 0) {
+        FolderLock lock(folder.path());
+        const char held = lock.state() == FolderLock::State::Held ? 'y' : 'n';
+        (void)::write(ready[1], &held, 1);
+        ::pause();
+        ::_exit(0);
+    }
+    char held = 0;
+    ASSERT_EQ(::read(ready[0], &held, 1), 1);
+    EXPECT_EQ(held, 'y');
+    EXPECT_EQ(FolderLock(folder.path()).state(), FolderLock::State::Taken);
+    ::kill(holder, SIGKILL);
+    ::waitpid(holder, nullptr, 0);
+    EXPECT_EQ(FolderLock(folder.path()).state(), FolderLock::State::Held);
+    // Where no lock file can be made the program runs unlocked rather than not at all.
+    EXPECT_EQ(FolderLock(folder.file("missing")).state(), FolderLock::State::Unlocked);
+    ::close(ready[0]);
+    ::close(ready[1]);
 }
 
 }  // namespace

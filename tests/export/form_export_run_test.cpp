@@ -1,6 +1,7 @@
 // The export run on in-memory controls, writing real files into a temporary output folder.
 #include <gtest/gtest.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <filesystem>
 
@@ -53,23 +54,35 @@ TEST(ExportRun, TextReportThenHtmlPageThenAReplacedReport) {
     EXPECT_EQ(f.out.get("Movies.html"),
               exporting::HtmlPage("Movies", text.substr(0, text.size() - 2)));
 
+    // A replaced report keeps the permission bits its owner gave it.
     f.main.folder.put("Movies.top", "Only one line\r\n");
+    ::chmod(f.out.file("Movies.TXT").c_str(), 0640);
     f.dialog.Checkhtml.userToggle();
     f.exportNow();
     EXPECT_TRUE(f.out.get("Movies.TXT").starts_with("Only one line\r\n.[Movies]"));
+    struct stat st {};
+    EXPECT_EQ(::stat(f.out.file("Movies.TXT").c_str(), &st) == 0 ? st.st_mode & 0777 : 0, 0640u);
     EXPECT_EQ(f.out.listing(), "Movies.TXT\nMovies.html\n");
 }
 
 TEST(ExportRun, TheListsFlagDecidesTheInformationColumn) {
-    // Flag 1 clears the box; a flag that is neither 0 nor 1 leaves it as it is.
-    for (auto [flag, box] : {std::pair{" 1 \r\n", 0}, std::pair{" 7 \r\n", 1}}) {
+    // Flag 1, or no flag file at all (older lists, as the main window shows them), clears the
+    // box; a flag that is neither 0 nor 1 leaves it as it is.
+    for (auto [flag, box] :
+         {std::pair{" 1 \r\n", 0}, std::pair{" 7 \r\n", 1}, std::pair{"[missing]", 0}}) {
         OpenMovies f(flag);
+        if (flag == std::string("[missing]"))
+            std::filesystem::remove(f.main.folder.file("Movies.inf"));
         f.dialog.Check_noinfo.setValue(1);
-        f.exportNow();
+        EXPECT_EQ(f.exportNow(), std::vector<std::string>{"Done 64: Export done!"});
         EXPECT_EQ(f.dialog.Check_noinfo.value(), box) << flag;
         EXPECT_EQ(f.out.get("Movies.TXT").find("| iNFORMATiON      |") != std::string::npos,
                   box == 0)
             << flag;
+        // The hidden box keeps nothing from one opening to the next.
+        f.dialog.window.userClose();
+        f.openDialog();
+        EXPECT_EQ(f.dialog.Check_noinfo.value(), 0);
     }
 }
 
@@ -109,7 +122,7 @@ TEST(ExportRun, LastAddedAboveOrBelowEverythingOrRefusedAndSavedCleared) {
 }
 
 TEST(ExportRun, FailuresNameTheFileAndKeepTheOlderReport) {
-    for (const char* missing : {"Movies.dat", "Movies.inf", "Movies.art"}) {
+    for (const char* missing : {"Movies.dat", "Movies.art"}) {
         OpenMovies f;
         f.dialog.Checkart.userToggle();
         std::filesystem::remove(f.main.folder.file(missing));
@@ -128,6 +141,16 @@ TEST(ExportRun, FailuresNameTheFileAndKeepTheOlderReport) {
     EXPECT_NE(shown[0].find("Movies.TXT"), std::string::npos) << shown[0];
     EXPECT_EQ(f.out.get("Movies.TXT"), "older report\r\n");
     EXPECT_EQ(f.out.listing(), "Movies.TXT\n");
+}
+
+// The optional top text is left out when it is no file; a FIFO is never waited on.
+TEST(ExportRun, ATopTextThatIsAFifoIsLeftOutWithoutWaiting) {
+    OpenMovies f;
+    ASSERT_EQ(::mkfifo(f.main.folder.file("Movies.top").c_str(), 0644), 0);
+    ::alarm(20);  // a blocking open ends the test run here instead of hanging it
+    EXPECT_EQ(f.exportNow(), std::vector<std::string>{"Done 64: Export done!"});
+    ::alarm(0);
+    EXPECT_TRUE(f.out.get("Movies.TXT").starts_with(".[Movies]")) << f.out.get("Movies.TXT");
 }
 
 TEST(ExportRun, NoSelectedListOnlyBeeps) {

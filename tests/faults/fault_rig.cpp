@@ -13,6 +13,8 @@
 #include <iostream>
 #include <sstream>
 
+#include "catalogue/folder_lock.h"
+
 namespace faults {
 
 namespace fs = std::filesystem;
@@ -21,11 +23,15 @@ using test_support::FaultySys;
 Files snapshot(const std::string& folder, const std::string& prefix) {
     Files files;
     for (const auto& item : fs::directory_iterator(folder)) {
+        // The running program's lock file is empty and carries no data.
+        if (item.path().filename() == catalogue::kLockName) continue;
         std::string& bytes = files[prefix + item.path().filename().string()];
         if (fs::is_symlink(item.symlink_status())) {
             bytes = "[link to " + fs::read_symlink(item.path()).string() + "]";
         } else if (fs::is_directory(item.symlink_status())) {
             bytes = "[folder]";
+        } else if (fs::is_fifo(item.symlink_status())) {
+            bytes = "[fifo]";
         } else {
             std::ostringstream in;
             in << std::ifstream(item.path(), std::ios::binary).rdbuf();

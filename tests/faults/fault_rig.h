@@ -38,9 +38,9 @@ class RigSys : public test_support::FaultySys {
         std::string path;
         bool reading;  // an open for reading, a read, or the close of a file opened for reading
     };
-    // The n-th call of `kind` from now on fails with `errnum`.
-    void failNext(test_support::SysCall kind, int n, int errnum) {
-        failAt(kind, calls(kind) + n, errnum);
+    // The n-th call of `kind` from now on fails with `errnum`, and the `times` - 1 after it.
+    void failNext(test_support::SysCall kind, int n, int errnum, int times = 1) {
+        failAt(kind, calls(kind) + n, errnum, times);
     }
     // The n-th call of any kind from now on kills the process before it is made.
     void killAt(int n) { killStep_ = steps() + n; }

@@ -53,5 +53,20 @@ TEST_F(Form1Test, ChangeKeepsTheEntrysPlaceAndKeepsOrRenewsItsNumberByItsFirstLe
     }
 }
 
+// A change that keeps the title leaves the article file alone, so it does not need one.
+TEST_F(Form1Test, AChangeThatKeepsTheTitleWorksWithoutTheArticleFile) {
+    startWithRock();
+    select("Zebra");
+    std::filesystem::remove(folder.file("Rock.art"));
+    fill({"Zebra", "Vinyl", "4", "Signed"});
+    platform.answer(Answer::Yes);
+    view.Command_change.click();
+    std::vector<Item> expected = rock;
+    expected.front() = {"Zebra", "Vinyl", "4", "Signed"};
+    EXPECT_EQ(folder.get("Rock.dat"), entries(expected));
+    EXPECT_FALSE(folder.has("Rock.art"));
+    expectReset();
+}
+
 }  // namespace
 }  // namespace main_window_test

@@ -117,6 +117,24 @@ TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) 
     }
 }
 
+// A second copy on a held folder reads and finishes nothing, not even the first copy's journal.
+TEST_F(Form1Test, ASecondCopyNamesTheFolderAndEndsWithStatusThreeTouchingNothing) {
+    putRock();
+    start();
+    folder.put("pemla.journal", "the first copy's commit, under way");
+    const Files before = snapshot();
+    ui::memory::MemoryPlatform other;
+    test_support::MemoryForm1 otherView;
+    main_window::Form1 second(otherView.controls(), other, store);
+    other.answer(Answer::Ok);
+    otherView.window.show();
+    ASSERT_EQ(other.shown().size(), 1u);
+    EXPECT_NE(other.shown()[0].prompt.find("\"" + folder.path() + "\""), std::string::npos);
+    EXPECT_EQ(other.endStatus(), 3);
+    EXPECT_EQ(otherView.List_list.count(), 0);
+    EXPECT_EQ(snapshot(), before);
+}
+
 // "Exit" ends at once, unloading nothing; closing unloads the loaded dialogs, export first.
 TEST_F(Form1Test, ExitEndsAtOnceAndClosingUnloadsTheLoadedDialogs) {
     MemoryWindow newList, exporter, search;

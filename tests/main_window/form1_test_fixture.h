@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "catalogue/folder_lock.h"
 #include "tests/support/memory_form1.h"
 
 // The main window's tests: a catalogue folder with the list "Rock", literal file contents built
@@ -90,7 +91,7 @@ class Form1Test : public ::testing::Test, public test_support::MainWindowFixture
         Files files;
         for (const auto& item : std::filesystem::directory_iterator(folder.path())) {
             const std::string name = item.path().filename().string();
-            files[name] = folder.get(name);
+            if (name != catalogue::kLockName) files[name] = folder.get(name);
         }
         return files;
     }

@@ -31,9 +31,10 @@ FaultySys::~FaultySys() {
     for (int fd : openFds_) ::close(fd);
 }
 
-void FaultySys::failAt(SysCall kind, int n, int errnum) {
+void FaultySys::failAt(SysCall kind, int n, int errnum, int times) {
     failKind_ = kind;
     failAt_ = n;
+    failTimes_ = times;
     failErrno_ = errnum;
 }
 
@@ -52,7 +53,7 @@ bool FaultySys::fault(SysCall kind) {
         dead_ = fired_ = true;
         throw CrashStop{};
     }
-    if (failAt_ > 0 && kind == failKind_ && count == failAt_) {
+    if (failAt_ > 0 && kind == failKind_ && count >= failAt_ && count < failAt_ + failTimes_) {
         fired_ = true;
         errno = failErrno_;
         return true;

@@ -26,8 +26,9 @@ class FaultySys : public catalogue::Sys {
   public:
     ~FaultySys() override;
 
-    // The n-th call (counting from 1) of `kind` fails with `errnum` without taking effect.
-    void failAt(SysCall kind, int n, int errnum);
+    // The n-th call (counting from 1) of `kind` fails with `errnum` without taking effect, and
+    // so do the `times` - 1 calls of that kind after it.
+    void failAt(SysCall kind, int n, int errnum, int times = 1);
     // The n-th call of any kind throws CrashStop; the process's open files are closed then.
     void crashAt(int step);
     // Writes move at most `bytes` bytes per call, as a pipe or a full disk may do.
@@ -54,6 +55,7 @@ class FaultySys : public catalogue::Sys {
     int steps_ = 0;
     SysCall failKind_ = SysCall::Open;
     int failAt_ = 0;
+    int failTimes_ = 1;
     int failErrno_ = 0;
     int crashAt_ = 0;
     bool fired_ = false;

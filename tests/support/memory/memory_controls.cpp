@@ -175,6 +175,8 @@ bool MemoryDirList::setPath(const std::string& path) {
 
 Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const std::string& title) {
     shown_.push_back({prompt, title, style});
+    // A box under the busy pointer looks as if the program were still working.
+    if (busyDepth_ > 0) throw MessageBoxWhileBusy{prompt};
     if (answers_.empty()) throw UnscriptedMessageBox{prompt, title, style};
     const Answer next = answers_.front();
     answers_.pop_front();

@@ -178,6 +178,11 @@ class MemoryDirList : public DirList, public Owned {
 
 // A message box that a test did not script. Deliberately not a std::exception, so that no
 // handler guard can swallow it: the test fails.
+// Thrown by a message box shown while the busy pointer is on.
+struct MessageBoxWhileBusy {
+    std::string prompt;
+};
+
 struct UnscriptedMessageBox {
     std::string prompt;
     std::string title;
