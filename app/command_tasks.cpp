@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
+#include <memory>
 #include <ostream>
 
 #include "catalogue/catalogue_error.h"
@@ -13,6 +14,7 @@
 #include "catalogue/entry_rules.h"
 #include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
+#include "catalogue/folder_lock.h"
 #include "catalogue/latin1.h"
 #include "catalogue/list_import.h"
 #include "catalogue/store.h"
@@ -37,16 +39,27 @@ std::string fileError(const catalogue::CatalogueError& e) {
     return "The file \"" + e.file() + "\" could not be used: " + e.reason() + ".";
 }
 
-// The catalogue as the window's start-up leaves it: an interrupted save finished, and the files
-// of lists saved by earlier builds under today's names (when that fails, the list in question
-// fails later with its file named).
-void openCatalogue(catalogue::Store& store, std::ostream& err) {
+// The catalogue as the window's start-up leaves it: the folder locked like a window's, an
+// interrupted save finished, and the files of lists saved by earlier builds under today's names
+// (when that fails, the list in question fails later with its file named). Where a running copy
+// holds the folder, finishing its journal or writing beside it could undo its work: a command
+// that writes is refused, one that only reads takes the files as they are. The lock is held until
+// the returned object goes.
+std::unique_ptr<catalogue::FolderLock> openCatalogue(catalogue::Store& store, std::ostream& err,
+                                                     bool writes) {
+    auto lock = std::make_unique<catalogue::FolderLock>(store.folder());
+    if (lock->state() == catalogue::FolderLock::State::Taken) {
+        if (!writes) return lock;
+        throw Failure{"Pemla is already running on the data folder \"" + store.folder() +
+                      "\": close it first. Nothing was imported."};
+    }
     store.recover();
     try {
         catalogue::renameLegacyListFiles(store, store.readLines(catalogue::kIndexFile));
     } catch (const catalogue::CatalogueError& e) {
         err << "pemla: " << fileError(e) << '\n';
     }
+    return lock;
 }
 
 // The list name typed on the command line, as the catalogue's ISO-8859-1 bytes.
@@ -154,7 +167,7 @@ int exportCommand(const CommandLine& line, const std::string& folder, std::ostre
                   std::ostream& err) {
     try {
         catalogue::Store store(folder);
-        openCatalogue(store, err);
+        const auto lock = openCatalogue(store, err, false);
         const std::string list = listedName(store, listName(line.list));
         const std::string bytes = exportBytes(line, store, list, err);
         if (line.outputFile) {
@@ -183,7 +196,7 @@ int importCommand(const CommandLine& line, const std::string& folder, std::ostre
         const std::string name = listName(line.list);
         const std::string csv = readWholeFile(line.file);
         catalogue::Store store(folder);
-        openCatalogue(store, err);
+        const auto lock = openCatalogue(store, err, true);
         const catalogue::ImportResult result = catalogue::importCsv(store, name, csv);
         if (!result.problem.empty()) throw Failure{latin1ToUtf8(result.problem)};
         for (const auto& refused : result.refused) {

@@ -7,6 +7,7 @@
 
 #include "app/command_line.h"
 #include "catalogue/entry_rules.h"
+#include "catalogue/folder_lock.h"
 #include "tests/export/export_fixture.h"
 #include "tests/main_window/form1_test_fixture.h"
 
@@ -142,7 +143,8 @@ TEST_F(Commands, ImportAddsEachRowAsAddWouldOrSaysWhyNot) {
                              " added to the list \"Rock\", " + std::to_string(c.refused.size()) +
                              " refused.\n");
     }
-    EXPECT_EQ(folder.listing(), "Rock.arn\nRock.art\nRock.dat\nRock.inf\nin.csv\npemla.dat\n");
+    EXPECT_EQ(folder.listing(),
+              "Rock.arn\nRock.art\nRock.dat\nRock.inf\nin.csv\npemla.dat\npemla.lock\n");
 }
 
 TEST_F(Commands, ImportCreatesAMissingListWithExactlyItsRowsOrRefusesTheWholeFile) {
@@ -238,6 +240,23 @@ TEST_F(Commands, RefusalsNameWhatFailed) {
         EXPECT_EQ(r.out, "");
     }
     EXPECT_EQ(folder.get("Rock.dat"), kRockDat);
+}
+
+// A folder that a running window holds is not written: no journal finished, no row imported.
+// An export there only reads (the dialog comparison below runs beside a window).
+TEST_F(Commands, ImportRefusesAFolderARunningCopyHolds) {
+    const catalogue::FolderLock window(folder.path());
+    ASSERT_EQ(window.state(), catalogue::FolderLock::State::Held);
+    folder.put("pemla.journal", "torn");
+    folder.put("in.csv", "title\r\nNew\r\n");
+    const std::string before = folder.listing();
+    const Outcome r = run(folder.path(), {"import", "Rock", folder.file("in.csv")});
+    EXPECT_EQ(r.status, 1);
+    EXPECT_EQ(r.err, "pemla: Pemla is already running on the data folder \"" + folder.path() +
+                         "\": close it first. Nothing was imported.\n");
+    EXPECT_EQ(folder.listing(), before);
+    EXPECT_EQ(folder.get("Rock.dat"), kRockDat);
+    EXPECT_EQ(folder.get("pemla.journal"), "torn");
 }
 
 // The command writes what the dialog writes with the same options: --html and --article-numbers
