@@ -5,19 +5,11 @@
 #include <string_view>
 #include <vector>
 
-// Comma-separated values as spreadsheets write and read them (RFC 4180), and the conversions
-// between the catalogue's ISO-8859-1 bytes and the UTF-8 such files are exchanged in.
+#include "catalogue/utf8.h"
+
+// Comma-separated values as spreadsheets write and read them (RFC 4180). Such files are
+// exchanged in UTF-8: catalogue/utf8.h converts.
 namespace catalogue {
-
-// The UTF-8 form of ISO-8859-1 bytes.
-std::string latin1ToUtf8(std::string_view latin1);
-
-// Whether bytes are well-formed UTF-8 (shortest forms, no surrogates, at most U+10FFFF).
-bool isUtf8(std::string_view bytes);
-
-// The ISO-8859-1 bytes of well-formed UTF-8 text, or nothing when it holds a character above
-// U+00FF; `outside` then receives that character's code point.
-std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside = nullptr);
 
 // One field as written: quoted (inner quotes doubled) when it holds a comma, a quote, CR or LF,
 // or starts or ends with a space; as it is otherwise.

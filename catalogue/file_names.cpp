@@ -2,39 +2,16 @@
 
 #include <set>
 
+#include "catalogue/utf8.h"
+
 namespace catalogue {
 
 std::string fileSystemName(std::string_view latin1) {
-    std::string out;
-    out.reserve(latin1.size());
-    for (const char ch : latin1) {
-        const auto c = static_cast<unsigned char>(ch);
-        if (c < 0x80) {
-            out.push_back(ch);
-        } else {
-            out.push_back(static_cast<char>(0xC0 | (c >> 6)));
-            out.push_back(static_cast<char>(0x80 | (c & 0x3F)));
-        }
-    }
-    return out;
+    return latin1ToUtf8(latin1);
 }
 
 std::optional<std::string> latin1Name(std::string_view bytes) {
-    std::string out;
-    out.reserve(bytes.size());
-    for (std::size_t i = 0; i < bytes.size(); ++i) {
-        const auto c = static_cast<unsigned char>(bytes[i]);
-        if (c < 0x80) {
-            out.push_back(bytes[i]);
-            continue;
-        }
-        // Only the two-byte forms of U+0080..U+00FF fit Latin-1; overlong forms are no UTF-8.
-        if ((c != 0xC2 && c != 0xC3) || i + 1 == bytes.size()) return std::nullopt;
-        const auto next = static_cast<unsigned char>(bytes[++i]);
-        if ((next & 0xC0) != 0x80) return std::nullopt;
-        out.push_back(static_cast<char>(((c & 0x03) << 6) | (next & 0x3F)));
-    }
-    return out;
+    return utf8ToLatin1(bytes);
 }
 
 std::string shownName(std::string_view bytes) {

@@ -1,0 +1,87 @@
+#include "catalogue/utf8.h"
+
+namespace catalogue {
+
+std::string latin1ToUtf8(std::string_view latin1) {
+    std::string utf8;
+    utf8.reserve(latin1.size() + latin1.size() / 8);
+    for (char c : latin1) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (byte < 0x80) {
+            utf8.push_back(c);
+        } else {
+            utf8.push_back(static_cast<char>(0xC0 | (byte >> 6)));
+            utf8.push_back(static_cast<char>(0x80 | (byte & 0x3F)));
+        }
+    }
+    return utf8;
+}
+
+namespace {
+
+// Decodes the character at `at`; nothing when the bytes there are no well-formed UTF-8.
+std::optional<char32_t> decodeOne(std::string_view bytes, std::size_t& at) {
+    const auto lead = static_cast<unsigned char>(bytes[at]);
+    int length = 0;
+    char32_t code = 0;
+    if (lead < 0x80) {
+        ++at;
+        return lead;
+    } else if (lead >= 0xC2 && lead <= 0xDF) {
+        length = 2;
+        code = lead & 0x1F;
+    } else if (lead >= 0xE0 && lead <= 0xEF) {
+        length = 3;
+        code = lead & 0x0F;
+    } else if (lead >= 0xF0 && lead <= 0xF4) {
+        length = 4;
+        code = lead & 0x07;
+    } else {
+        return std::nullopt;
+    }
+    if (at + static_cast<std::size_t>(length) > bytes.size()) return std::nullopt;
+    for (int i = 1; i < length; ++i) {
+        const auto next = static_cast<unsigned char>(bytes[at + static_cast<std::size_t>(i)]);
+        if ((next & 0xC0) != 0x80) return std::nullopt;
+        code = (code << 6) | (next & 0x3F);
+    }
+    const char32_t smallest = length == 3 ? 0x800 : length == 4 ? 0x10000 : 0x80;
+    if (code < smallest || code > 0x10FFFF || (code >= 0xD800 && code <= 0xDFFF)) {
+        return std::nullopt;
+    }
+    at += static_cast<std::size_t>(length);
+    return code;
+}
+
+}  // namespace
+
+bool isUtf8(std::string_view bytes) {
+    for (std::size_t at = 0; at < bytes.size();) {
+        if (static_cast<unsigned char>(bytes[at]) < 0x80) {
+            ++at;  // most of a file is ASCII
+        } else if (!decodeOne(bytes, at)) {
+            return false;
+        }
+    }
+    return true;
+}
+
+std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside) {
+    std::string latin1;
+    latin1.reserve(utf8.size());
+    for (std::size_t at = 0; at < utf8.size();) {
+        if (static_cast<unsigned char>(utf8[at]) < 0x80) {
+            latin1.push_back(utf8[at++]);
+            continue;
+        }
+        const std::optional<char32_t> code = decodeOne(utf8, at);
+        if (!code || *code > 0xFF) {
+            if (outside != nullptr) *outside = code.value_or(0xFFFD);
+            return std::nullopt;
+        }
+        latin1.push_back(static_cast<char>(*code));
+    }
+    return latin1;
+}
+
+}  // namespace catalogue

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+// Conversions between the catalogue's ISO-8859-1 bytes and UTF-8, the encoding of file names and
+// of the CSV files the catalogue exchanges.
+namespace catalogue {
+
+// The UTF-8 form of ISO-8859-1 bytes.
+std::string latin1ToUtf8(std::string_view latin1);
+
+// Whether bytes are well-formed UTF-8 (shortest forms, no surrogates, at most U+10FFFF).
+bool isUtf8(std::string_view bytes);
+
+// The ISO-8859-1 bytes of well-formed UTF-8 text, or nothing when it holds a character above
+// U+00FF; `outside` then receives that character's code point.
+std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside = nullptr);
+
+}  // namespace catalogue
