@@ -27,13 +27,8 @@ struct Windows {
         program.mainWindow().List_list->setCurrentItem(music.front());  // opens the list
     }
     static const std::string& filled(const test_support::TempFolder& files) {
+        test_support::putMusicCatalogue(files);
         files.put("type.dat", "Types\r\nAn uncommonly long type of disc, longer than any box\r\n");
-        files.put("information.dat", "Information\r\nOriginal\r\n");
-        files.put("pemla.dat", "Music\r\n");
-        files.put("Music.dat", "<|?Zebra\r\n<|'CD\r\n<||1\r\n<|*Original\r\n");
-        files.put("Music.art", "Zebra#*\\Z001\r\n");
-        files.put("Music.arn", "Z#002\r\n");
-        files.put("Music.inf", " 1 \r\n");
         return files.path();
     }
     // Every window, each shown (and so loaded, with its captions).

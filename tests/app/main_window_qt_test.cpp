@@ -54,20 +54,9 @@ void answerAll(ui::Answer answer) {
     });
 }
 
-// The list "Music" holding "Zebra".
-void putMusic(const test_support::TempFolder& folder) {
-    folder.put("type.dat", "Types\r\nMusic CD\r\nGame\r\n");
-    folder.put("information.dat", "Information\r\nOriginal\r\n");
-    folder.put("pemla.dat", "Music\r\n");
-    folder.put("Music.dat", "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n");
-    folder.put("Music.art", "Zebra#*\\Z001\r\n");
-    folder.put("Music.arn", "A#001\r\nZ#002\r\n");
-    folder.put("Music.inf", " 1 \r\n");
-}
-
 TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
     test_support::TempFolder folder;
-    putMusic(folder);
+    test_support::putMusicCatalogue(folder);
     QtMainWindow w(folder);
     w.view.controls().window.show();
     ASSERT_FALSE(w.platform.ended());
@@ -125,7 +114,7 @@ TEST(MainWindowOnQt, AddChangeAndDeleteThroughTheWidgets) {
 // waiting for ever on a copy that opened its main window.
 TEST(MainWindowOnQt, ASecondRealCopyOnTheSameFolderEndsAndTheFirstStillWrites) {
     test_support::TempFolder folder;
-    putMusic(folder);
+    test_support::putMusicCatalogue(folder);
     QtMainWindow w(folder);
     w.view.controls().window.show();
     const std::string before = folder.listing() + folder.get("Music.dat") + folder.get("pemla.dat");

@@ -48,13 +48,7 @@ void expectOwnWindowAbove(QWidget* dialog, QWidget* main) {
 // the opening, the keys they ignore and the closing by the close box.
 TEST(DialogsOnQt, EachDialogDisablesTheMainWindowUntilItCloses) {
     test_support::TempFolder folder;
-    folder.put("type.dat", "Types\r\nMusic CD\r\n");
-    folder.put("information.dat", "Information\r\nOriginal\r\n");
-    folder.put("pemla.dat", "Pop\r\n");
-    folder.put("Pop.dat", "<|?Abba Gold\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n");
-    folder.put("Pop.art", "Abba Gold#*\\A001\r\n");
-    folder.put("Pop.arn", "A#002\r\n");
-    folder.put("Pop.inf", " 1 \r\n");
+    test_support::putMusicCatalogue(folder);
     BoxRecorder boxes;
     // The four windows as the program builds them.
     catalogue::Store store(folder.path());
@@ -87,7 +81,7 @@ TEST(DialogsOnQt, EachDialogDisablesTheMainWindowUntilItCloses) {
     EXPECT_TRUE(newList->isVisible());
     newList->close();  // the close box
     EXPECT_TRUE(!newList->isVisible() && view.widget()->isEnabled());
-    EXPECT_EQ(folder.get("pemla.dat"), "Pop\r\n");
+    EXPECT_EQ(folder.get("pemla.dat"), "Music\r\n");
 
     QTest::mouseClick(view.List_list->viewport(), Qt::LeftButton, {},
                       view.List_list->visualItemRect(view.List_list->item(0)).center());
@@ -106,10 +100,10 @@ TEST(DialogsOnQt, EachDialogDisablesTheMainWindowUntilItCloses) {
 
     // Without its article file the list cannot be searched: the box names the file, and the
     // dialog never stays open over a disabled main window.
-    std::filesystem::remove(folder.file("Pop.art"));
+    std::filesystem::remove(folder.file("Music.art"));
     click(view.Command_search);
     ASSERT_EQ(boxes.texts.size(), 1);
-    EXPECT_TRUE(boxes.texts[0].contains(QStringLiteral("\"Pop.art\"")))
+    EXPECT_TRUE(boxes.texts[0].contains(QStringLiteral("\"Music.art\"")))
         << boxes.texts[0].toStdString();
     EXPECT_TRUE(!search->isVisible() && view.widget()->isEnabled());
 }

@@ -57,4 +57,14 @@ std::string TempFolder::listing() const {
     return out;
 }
 
+void putMusicCatalogue(const TempFolder& folder) {
+    folder.put("type.dat", "Types\r\nMusic CD\r\nGame\r\n");
+    folder.put("information.dat", "Information\r\nOriginal\r\n");
+    folder.put("pemla.dat", "Music\r\n");
+    folder.put("Music.dat", "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n");
+    folder.put("Music.art", "Zebra#*\\Z001\r\n");
+    folder.put("Music.arn", "A#001\r\nZ#002\r\n");
+    folder.put("Music.inf", " 1 \r\n");
+}
+
 }  // namespace test_support

@@ -27,4 +27,8 @@ class TempFolder {
     std::string path_;
 };
 
+// A small catalogue for the tests of the real windows: the suggestion files and the list "Music"
+// holding "Zebra" (Music CD, 1 disc, Original, Z001).
+void putMusicCatalogue(const TempFolder& folder);
+
 }  // namespace test_support
