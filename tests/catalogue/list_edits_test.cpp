@@ -4,9 +4,6 @@
 
 #include <gtest/gtest.h>
 
-#include <chrono>
-
-#include "bench/catalogue_maker.h"
 #include "catalogue/entry_rules.h"
 #include "catalogue/file_text.h"
 #include "tests/support/temp_folder.h"
@@ -357,42 +354,6 @@ TEST_F(ListEdits, CreateWritesTheIndexLineAndAnEmptyListOrRefusesTheName) {
     ASSERT_TRUE(createList(store, "One more", 1));
     const test_support::Files full = test_support::snapshot(folder.path());
     expectRefused(createList(store, "Too many", 1), Refused::CatalogueFull, kCatalogueFull, full);
-}
-
-// A list at its largest: 32767 entries of about 100 bytes. It refuses another title, and every
-// change to it stays well under a second (only work that grows with the square of the list would
-// not; the benchmark measures the real figures).
-TEST_F(ListEdits, AFullListRefusesAnAddAndEveryChangeToItIsQuick) {
-    bench::writeList(folder.path(), "Big", kMaxEntries);
-    const auto timed = [](const char* what, auto action) {
-        const auto start = std::chrono::steady_clock::now();
-        action();
-        const std::chrono::duration<double, std::milli> ms =
-            std::chrono::steady_clock::now() - start;
-#ifdef NDEBUG
-        EXPECT_LT(ms.count(), 1000.0) << what;
-#endif
-    };
-    const std::string dat = folder.get("Big.dat");
-    const test_support::Files before = test_support::snapshot(folder.path());
-    expectRefused(addEntry(store, read("Big"), {"One too many", "CD", "1", ""}), Refused::ListFull,
-                  kListFull, before);
-    const std::vector<std::string> titles = *entryTitles(dat);
-    const std::string middle = titles[titles.size() / 2];
-    timed("change", [&] {
-        EXPECT_TRUE(changeEntry(store, read("Big"), middle, {middle, "Vinyl", "1", ""}));
-    });
-    timed("delete", [&] { EXPECT_TRUE(deleteEntry(store, read("Big"), titles[1])); });
-    timed("add", [&] { EXPECT_TRUE(addEntry(store, read("Big"), {"Zz last", "CD", "1", ""})); });
-    // The changed entry in its place, the deleted one gone, the added one at the end.
-    std::string expected = dat;
-    const auto replace = [&](const std::string& title, const std::string& by) {
-        expected.replace(expected.find("<|?" + title + "\r\n"),
-                         entryText({*findEntry(dat, title)}).size(), by);
-    };
-    replace(middle, entryText({{middle, "Vinyl", "1", ""}}));
-    replace(titles[1], "");
-    EXPECT_EQ(folder.get("Big.dat"), expected + entryText({{"Zz last", "CD", "1", ""}}));
 }
 
 }  // namespace

@@ -54,7 +54,8 @@ TEST_F(Form1Test, AddWithNoListOpenSaysSo) {
     EXPECT_EQ(files(), before);
 }
 
-// The window counts the titles it shows: a full list refuses another.
+// A list at its largest (32767 entries of about 100 bytes): the window counts the titles it
+// shows, and refuses another.
 TEST_F(Form1Test, AFullListRefusesAnAdd) {
     bench::writeList(folder.path(), "Big", catalogue::kMaxEntries);
     folder.put("pemla.dat", "Big\r\n");

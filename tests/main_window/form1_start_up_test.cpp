@@ -30,17 +30,6 @@ TEST_F(Form1Test, StartUpFillsTheBoxesButNeverOffersASuggestionFilesFirstLine) {
     EXPECT_FALSE(platform.ended());
 }
 
-TEST_F(Form1Test, OneLineSuggestionFilesAndAnEmptyIndexStartWithEmptyBoxes) {
-    folder.put("type.dat", "Types\r\n");
-    folder.put("information.dat", "Information, no line end");
-    start();
-    EXPECT_EQ(view.Combo1.itemCount(), 0);
-    EXPECT_EQ(view.Combo3.itemCount(), 0);
-    EXPECT_EQ(view.List_list.count(), 0);
-    EXPECT_FALSE(platform.ended());
-    EXPECT_TRUE(platform.shown().empty());
-}
-
 // An earlier build named a list's files with the Latin-1 bytes of its name. At the start they
 // take their UTF-8 names, bytes untouched, and the list works on as before.
 TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
