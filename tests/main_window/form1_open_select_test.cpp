@@ -81,10 +81,11 @@ TEST_F(Form1Test, OpeningShowsTheTitlesSortedAndSelectingOneFillsTheFields) {
     view.Command_clear.click();
     expectReset();
 
-    // The article file is read at every selection; a title without a line shows no number.
-    folder.put("Rock.art", articleText({{"xabc", "X001"}, {"ABC", "B123"}}));
+    // The article file is read at every selection; a number shows up to its line end, and a
+    // title without a line shows none.
+    folder.put("Rock.art", articleText({{"xabc", "X001"}, {"ABC", "B12"}}));
     select("abc");
-    EXPECT_EQ(fields(), "abc|Game|3||B123");
+    EXPECT_EQ(fields(), "abc|Game|3||B12");
     select("abcd");
     EXPECT_EQ(fields(), "abcd|DVD|2|Copy|");
     EXPECT_TRUE(platform.shown().empty());
