@@ -6,6 +6,7 @@
 
 #include "catalogue/entry_rules.h"
 #include "catalogue/file_text.h"
+#include "tests/support/faulty_sys.h"
 #include "tests/support/temp_folder.h"
 
 namespace catalogue {
@@ -249,6 +250,17 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
                   "The title cannot hold a line break: the list's files use it to mark their "
                   "records.",
                   before);
+}
+
+// A change of one file is made durable by flushing the folder after its rename; a failed flush
+// is tried once more before it would be reported, as the change is made by then.
+TEST_F(ListEdits, AOneFileChangeFlushesTheFolderAfterItsRename) {
+    test_support::FaultySys sys;
+    Store flushed(folder.path(), sys);
+    sys.failAt(test_support::SysCall::Fsync, 2, EIO);
+    ASSERT_TRUE(changeEntry(flushed, read("Rock"), "Zebra", {"Zebra", "LP", "2", ""}));
+    EXPECT_TRUE(sys.fired());
+    EXPECT_EQ(sys.calls(test_support::SysCall::Fsync), 3);
 }
 
 TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
