@@ -102,7 +102,7 @@ void setUp(Rig& r, const Operation& op) {
               crlf({"M#002"}));
     r.folder.put("pemla.dat", op.onlyList ? crlf({"Solo"}) : crlf({"Rock", "Jazz", "Solo"}));
     const char* html = op.exportDialog == 1 ? "1" : "0";
-    r.folder.put("export.dat", crlf({r.out->path(), "0", html, "0", "0", "0", "0", "10", "Top"}));
+    r.folder.put("export.dat", crlf({r.out.path(), "0", html, "0", "0", "0", "0", "10", "Top"}));
     if (op.earlierBuild) {
         r.putList("B\xFChne", kAbbaDat, crlf({"Abba Gold#*\\A001"}), crlf({"A#002"}));
         r.folder.put("pemla.dat", crlf({"Rock", "B\xFChne"}));
@@ -184,7 +184,7 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
                 const std::string file = namedFile(errors.front().prompt);
                 EXPECT_TRUE(file.empty() || before.contains(file) || after.contains(file) ||
                             after.contains("out/" + file) || file == catalogue::kJournalName ||
-                            file == r.folder.path() || file == r.out->path())
+                            file == r.folder.path() || file == r.out.path())
                     << errors.front().prompt;
                 runAction(r, op, false);
                 Files retried = r.files();

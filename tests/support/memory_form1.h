@@ -46,10 +46,9 @@ struct MemoryForm1 {
 
 // A catalogue folder with the supplied suggestion files and an empty index, an output folder,
 // and the main window with its new-list and export dialogs on it, every system call going
-// through `sys`. Given a folder, the windows work over that one (and no output folder) and
-// leave it in place. Call start() after putting the files a test needs.
+// through `sys`. Call start() after putting the files a test needs.
 struct MainWindowFixture {
-    explicit MainWindowFixture(const std::string& existing = {});
+    MainWindowFixture();
 
     // Writes a list's files: entry text, article text, counter text, and the flag (none when
     // `flag` is empty).
@@ -83,7 +82,7 @@ struct MainWindowFixture {
                    const std::string& prompt = {}) const;
 
     TempFolder folder;
-    std::unique_ptr<TempFolder> out;
+    TempFolder out;
     FaultySys sys;
     catalogue::Store store;
     ui::memory::MemoryPlatform platform;
