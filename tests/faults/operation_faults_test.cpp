@@ -5,7 +5,6 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
-#include <iostream>
 
 #include "catalogue/file_text.h"
 #include "catalogue/list_import.h"
@@ -157,9 +156,8 @@ class OperationFaults : public ::testing::TestWithParam<Operation> {};
 TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
     const Operation& op = GetParam();
     const auto [before, after] = reference(op);
-    int points = 0, kept = 0, readAfter = 0;
     for (SysCall kind : test_support::kAllSysCalls) {
-        for (int n = 1;; ++n, ++points) {
+        for (int n = 1;; ++n) {
             SCOPED_TRACE(std::string(test_support::sysCallName(kind)) + " #" + std::to_string(n));
             Rig r;
             setUp(r, op);
@@ -178,7 +176,6 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
             EXPECT_EQ(left, now) << difference(left, now);
             const auto errors = r.errors();
             if (now == before) {
-                ++kept;
                 ASSERT_EQ(errors.size(), 1u) << "a failure nobody was told of";
                 EXPECT_EQ(errors.front().style, 16);
                 const std::string file = namedFile(errors.front().prompt);
@@ -193,7 +190,6 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
                 EXPECT_EQ(r.errors().size(), 1u);
             } else if (now == after && !errors.empty()) {
                 // Done; only a failed read while showing the result may still be reported.
-                ++readAfter;
                 const std::string& path = r.sys.hit()->path;
                 EXPECT_TRUE(r.sys.hit()->reading) << errors.front().prompt;
                 EXPECT_TRUE(path.ends_with("/" + namedFile(errors.front().prompt))) << path;
@@ -202,17 +198,12 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
             }
         }
     }
-    std::cout << "[ faults ] " << op.name << ": " << points << " fault points, " << kept
-              << " kept the old files and said so, " << points - kept << " finished the change ("
-              << readAfter << " then told of a failed read while showing it)\n";
-    EXPECT_GT(points, 0);
 }
 
 TEST_P(OperationFaults, AKillAtAnyStepRecoversToTheOldOrTheNewFiles) {
     const Operation& op = GetParam();
     const auto [before, after] = reference(op);
-    int points = 0, finished = 0;
-    for (int step = 1;; ++step, ++points) {
+    for (int step = 1;; ++step) {
         SCOPED_TRACE("killed at step " + std::to_string(step));
         Rig r;
         setUp(r, op);
@@ -230,12 +221,8 @@ TEST_P(OperationFaults, AKillAtAnyStepRecoversToTheOldOrTheNewFiles) {
             break;
         }
         EXPECT_FALSE(dropStrays(now)) << "a name probe or report copy left after the start";
-        finished += now == after ? 1 : 0;
         EXPECT_TRUE(now == after || now == before) << difference(before, now);
     }
-    std::cout << "[ faults ] " << op.name << ": " << points << " kill points, " << finished
-              << " recovered to the new files, " << points - finished << " to the old\n";
-    EXPECT_GT(points, 0);
 }
 
 // Another program rewrites the open list's entry file (or, for a list deletion, the index) after
