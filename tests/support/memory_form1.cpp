@@ -63,9 +63,6 @@ bool MainWindowFixture::select(const std::string& title) {
 }
 
 void MainWindowFixture::fill(const catalogue::Entry& e) {
-    const auto retype = [](auto& box, const std::string& text) {
-        box.type(std::string(box.text().size(), '\b') + text);
-    };
     retype(view.Text1, e.title);
     retype(view.Combo1, e.type);
     retype(view.Combo2, e.discs);

@@ -62,8 +62,12 @@ struct MainWindowFixture {
     // not shown.
     bool open(const std::string& list);
     bool select(const std::string& title);
-    // The user clears the entry fields and types these values.
+    // The user clears the entry fields and types these values; or clears one box and types.
     void fill(const catalogue::Entry& entry);
+    template <typename Box>
+    static void retype(Box& box, const std::string& text) {
+        box.type(std::string(box.text().size(), '\b') + text);
+    }
     // The user adds "Dylan" (Game, 1) with this information to the open list, or deletes the
     // selected list confirming twice; an error box, should one come, is answered.
     void addDylan(const std::string& information = "x");
