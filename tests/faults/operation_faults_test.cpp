@@ -13,7 +13,6 @@
 namespace faults {
 namespace {
 
-using test_support::SysCall;
 using ui::Answer;
 
 struct Operation {
