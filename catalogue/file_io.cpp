@@ -66,7 +66,7 @@ std::string folderOf(const std::string& path) {
 }
 
 void writeAll(Sys& sys, const std::string& fullPath, const std::string& shown,
-              std::string_view bytes, const mode_t* keepMode, bool durable) {
+              std::string_view bytes, const mode_t* keepMode, bool durable, FileStamp* written) {
     const int fd = sys.open(fullPath, O_WRONLY | O_CREAT | O_TRUNC | O_NONBLOCK, 0666);
     if (fd < 0) throw osError(shown, errno);
     if (keepMode != nullptr) (void)::fchmod(fd, *keepMode);
@@ -88,6 +88,9 @@ void writeAll(Sys& sys, const std::string& fullPath, const std::string& shown,
         sys.unlink(fullPath);
         throw osError(shown, err);
     }
+    // Taken after the last write, so the stamp is the one the file keeps once it is in place.
+    struct stat st {};
+    if (written != nullptr && ::fstat(fd, &st) == 0) *written = stampFrom(st);
     if (sys.close(fd) != 0) {
         const int err = errno;
         sys.unlink(fullPath);

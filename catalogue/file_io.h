@@ -28,9 +28,11 @@ std::string folderOf(const std::string& path);
 
 // Writes a staged file. `keepMode` gives it the permission bits of the file it will replace; a
 // file system that keeps no such bits may refuse them, which is no error. Without `durable` the
-// data is not flushed: for records that only a killed process needs.
+// data is not flushed: for records that only a killed process needs. `written`, when given,
+// receives the stamp of the finished file, which a rename into place keeps.
 void writeAll(Sys& sys, const std::string& fullPath, const std::string& shown,
-              std::string_view bytes, const mode_t* keepMode = nullptr, bool durable = true);
+              std::string_view bytes, const mode_t* keepMode = nullptr, bool durable = true,
+              FileStamp* written = nullptr);
 
 void syncDirectory(Sys& sys, const std::string& folder, const std::string& shown);
 

@@ -31,6 +31,11 @@ CatalogueError missingEntry(const OpenList& list, const std::string& title) {
     return CatalogueError(entryFile(list.name), "the entry \"" + title + "\" is not in the file");
 }
 
+// The title as the entry file spells it: a lookup ignores case, the list shows the file's own.
+std::string titleAt(std::string_view entries, const EntrySpan& found, const std::string& title) {
+    return std::string(entries.substr(found.at + kTitleTag.size(), title.size()));
+}
+
 }  // namespace
 
 void finishEarlierChange(Store& store) {
@@ -77,6 +82,8 @@ EditResult addEntry(Store& store, const OpenList& list, const Entry& entry) {
     text += articleLine(entry.title, result.articleNumber);
     t.write(articles, text);
     t.commit();
+    result.stamp = t.written(entryFile(list.name));
+    result.addedTitle = entry.title;
     return result;
 }
 
@@ -86,7 +93,8 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
         return refused(Refused::BadEntry, std::move(words));
     }
     if (!list.whole) return notReadWhole(list);
-    std::optional<std::string> newText = replaceEntry(list.entries, oldTitle, entry);
+    EntrySpan found;
+    std::optional<std::string> newText = replaceEntry(list.entries, oldTitle, entry, &found);
     if (!newText) throw missingEntry(list, oldTitle);
 
     EditResult result;
@@ -116,6 +124,11 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
     }
     t.write(entryFile(list.name), *newText);
     t.commit();
+    result.stamp = t.written(entryFile(list.name));
+    if (found.oneEntry) {
+        result.removedTitle = titleAt(list.entries, found, oldTitle);
+        result.addedTitle = entry.title;
+    }
     result.entries = std::move(*newText);
     return result;
 }
@@ -127,12 +140,14 @@ EditResult deleteEntry(Store& store, const OpenList& list, const std::string& ti
     if (list.titles == 1) {
         planEmptyList(t, list.name);
         t.commit();
+        result.stamp = t.written(entryFile(list.name));
         result.entries = kSkeletonEntries;
         result.emptied = true;
         return result;
     }
     if (!list.whole) return notReadWhole(list);
-    std::optional<std::string> newText = removeEntry(list.entries, title);
+    EntrySpan found;
+    std::optional<std::string> newText = removeEntry(list.entries, title, &found);
     if (!newText) throw missingEntry(list, title);
     t.write(entryFile(list.name), *newText);
     const std::string articleName = articleFile(list.name);
@@ -140,6 +155,8 @@ EditResult deleteEntry(Store& store, const OpenList& list, const std::string& ti
         t.write(articleName, removeArticleLine(*articles, title));
     }
     t.commit();
+    result.stamp = t.written(entryFile(list.name));
+    if (found.oneEntry) result.removedTitle = titleAt(list.entries, found, title);
     result.entries = std::move(*newText);
     return result;
 }

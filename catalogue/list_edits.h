@@ -37,6 +37,13 @@ struct EditResult {
     std::string articleNumber;
     // A delete that took the last title gave the list the placeholder entry.
     bool emptied = false;
+    // The entry file as the change left it: what the next change is checked against.
+    FileStamp stamp;
+    // How the titles the list shows changed, when exactly that is known: the title taken out
+    // (change, delete) and the one put in (add, change). Neither is set when the list has to
+    // be read again to be shown: an emptied list, or values holding record markers.
+    std::optional<std::string> removedTitle;
+    std::optional<std::string> addedTitle;
 
     explicit operator bool() const { return refused == Refused::None; }
 };

@@ -1,5 +1,7 @@
 #include "catalogue/records.h"
 
+#include <algorithm>
+
 #include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
@@ -31,6 +33,21 @@ std::size_t lineEnd(std::string_view text, std::size_t at) {
 std::size_t entryEnd(std::string_view text, std::size_t at) {
     const std::size_t next = text.find(kTitleTag, at + 1);
     return next == npos ? text.size() : next;
+}
+
+// Describes the entry span [at, end) of a file text (every line followed by CR LF).
+EntrySpan spanOf(std::string_view text, std::size_t at, std::size_t end) {
+    EntrySpan span{at, end, false};
+    const auto lineStart = [&](std::size_t pos) {
+        return pos == 0 || pos == text.size() || (pos >= 2 && text.substr(pos - 2, 2) == kCrLf);
+    };
+    if (!lineStart(at) || !lineStart(end)) return span;
+    const auto crs = [&](std::size_t from, std::size_t to) {
+        return std::count(text.begin() + static_cast<std::ptrdiff_t>(from),
+                          text.begin() + static_cast<std::ptrdiff_t>(to), '\r');
+    };
+    span.oneEntry = crs(at, end) == 4 && crs(0, at) % 4 == 0;
+    return span;
 }
 
 }  // namespace
@@ -102,10 +119,11 @@ std::string appendEntry(std::string_view entries, const Entry& entry) {
 }
 
 std::optional<std::string> replaceEntry(std::string_view entries, std::string_view oldTitle,
-                                        const Entry& entry) {
+                                        const Entry& entry, EntrySpan* found) {
     const std::size_t at = findTitleLine(entries, oldTitle);
     if (at == npos) return std::nullopt;
     const std::size_t end = entryEnd(entries, at);
+    if (found != nullptr) *found = spanOf(entries, at, end);
     std::string text;
     text.reserve(entries.size() + entry.title.size() + 64);
     text.append(entries.substr(0, at));
@@ -114,10 +132,12 @@ std::optional<std::string> replaceEntry(std::string_view entries, std::string_vi
     return text;
 }
 
-std::optional<std::string> removeEntry(std::string_view entries, std::string_view title) {
+std::optional<std::string> removeEntry(std::string_view entries, std::string_view title,
+                                       EntrySpan* found) {
     const std::size_t at = findTitleLine(entries, title);
     if (at == npos) return std::nullopt;
     const std::size_t end = entryEnd(entries, at);
+    if (found != nullptr) *found = spanOf(entries, at, end);
     std::string text;
     text.reserve(entries.size());
     text.append(entries.substr(0, at));

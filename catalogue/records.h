@@ -57,14 +57,26 @@ std::string entryLines(const Entry& entry);
 // The entry text with the entry appended at its end.
 std::string appendEntry(std::string_view entries, const Entry& entry);
 
+// Where an edit found the entry it replaced or removed: from its title line up to the next
+// title marker or the end of the text.
+struct EntrySpan {
+    std::size_t at = 0;
+    std::size_t end = 0;
+    // The span is exactly one entry's four lines, lined up with the entries counted from the
+    // start: the edit changed that one title and no other. A value holding a record marker (in
+    // a file from elsewhere) can make the span cut across entries instead.
+    bool oneEntry = false;
+};
+
 // The entry text with the entry titled `oldTitle` (first match, ignoring case) replaced in place.
-// Nothing when no such entry exists.
+// Nothing when no such entry exists. `found`, when given, receives where the entry was.
 std::optional<std::string> replaceEntry(std::string_view entries, std::string_view oldTitle,
-                                        const Entry& entry);
+                                        const Entry& entry, EntrySpan* found = nullptr);
 
 // The entry text without the entry titled `title` (first match, ignoring case). Nothing when
-// no such entry exists.
-std::optional<std::string> removeEntry(std::string_view entries, std::string_view title);
+// no such entry exists. `found`, when given, receives where the entry was.
+std::optional<std::string> removeEntry(std::string_view entries, std::string_view title,
+                                       EntrySpan* found = nullptr);
 
 // Position of the first article line whose text before "#*\" equals the title ignoring case.
 std::size_t findArticleLine(std::string_view articles, std::string_view title);

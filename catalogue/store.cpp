@@ -93,8 +93,8 @@ FileStamp Store::stampOf(const std::string& name) const {
 }
 
 void Store::writeDurable(const std::string& fullPath, const std::string& shownName,
-                         std::string_view bytes, const mode_t* keepMode) {
-    writeAll(sys_, fullPath, shownName, bytes, keepMode);
+                         std::string_view bytes, const mode_t* keepMode, FileStamp* written) {
+    writeAll(sys_, fullPath, shownName, bytes, keepMode, true, written);
 }
 
 void Store::syncFolder() {

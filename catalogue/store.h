@@ -74,6 +74,9 @@ class Transaction {
     // after the point of no return that a retry cannot mend throws UnfinishedChange. A replaced
     // file keeps its permission bits.
     void commit();
+    // After commit(): the stamp of a file it wrote, as the file stands in place; a file it did
+    // not write has no stamp (exists is false).
+    FileStamp written(const std::string& name) const;
 
   private:
     enum class Kind { Write, Remove, Rename };
@@ -85,6 +88,7 @@ class Transaction {
     Store& store_;
     std::vector<Action> actions_;
     std::vector<std::pair<std::string, FileStamp>> expected_;
+    std::vector<std::pair<std::string, FileStamp>> written_;
 };
 
 class Store {
@@ -143,7 +147,8 @@ class Store {
     friend class Transaction;
 
     void writeDurable(const std::string& fullPath, const std::string& shownName,
-                      std::string_view bytes, const mode_t* keepMode = nullptr);
+                      std::string_view bytes, const mode_t* keepMode = nullptr,
+                      FileStamp* written = nullptr);
     void syncFolder();
     std::string tempName(const std::string& name);
     void apply(const JournalPlan& plan);

@@ -48,6 +48,13 @@ void Transaction::rename(const std::string& from, const std::string& to) {
     actions_.push_back({to, Kind::Rename, from});
 }
 
+FileStamp Transaction::written(const std::string& name) const {
+    for (const auto& [file, stamp] : written_) {
+        if (file == name) return stamp;
+    }
+    return {};
+}
+
 void Transaction::commit() {
     if (actions_.empty()) return;
     // The last plan for a name decides; earlier ones for it are dropped.
@@ -82,8 +89,10 @@ void Transaction::commit() {
                 staged.push_back(s.tempName(action.name));
                 journal.renames.emplace_back(staged.back(), action.name);
                 const std::optional<mode_t> mode = modeOf(s.path(action.name));
+                FileStamp stamp;
                 s.writeDurable(s.path(staged.back()), action.name, action.bytes,
-                               mode ? &*mode : nullptr);
+                               mode ? &*mode : nullptr, &stamp);
+                written_.emplace_back(action.name, stamp);
             } else {
                 journal.deletions.push_back(action.name);
             }

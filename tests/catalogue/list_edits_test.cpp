@@ -275,8 +275,14 @@ TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
             if (line.first != title) art.push_back(line);
         }
         EXPECT_EQ(result.entries, entryText(dat));
+        EXPECT_EQ(result.removedTitle, title);
+        EXPECT_EQ(result.stamp, store.stampOf("Rock.dat"));
         expectList("Rock", entryText(dat), articleText(art), crlf(kRockArn));
     }
+    // A value holding a title marker (a file from elsewhere) makes the cut cross entries: which
+    // titles are left is then not known without reading the list again.
+    folder.put("Rock.dat", entryText({{"Zebra", "CD", "1", "x<|?abc"}, kRock[2], kRock[3]}));
+    EXPECT_FALSE(deleteEntry(store, read("Rock"), "abc").removedTitle);
     // Without an article file, the entry alone goes.
     putRock();
     folder.remove(("Rock.art"));
