@@ -52,12 +52,18 @@ class Label {
 class ListBox {
   public:
     virtual ~ListBox() = default;
+    // Puts one item at its place in the order, as a refill would; a selected item stays so.
     virtual void addItem(const std::string& text) = 0;
+    // Takes out one item equal to `text`, as a refill without it would leave the others; false
+    // when there is none. Removing the selected item leaves nothing selected.
+    virtual bool removeItem(const std::string& text) = 0;
     // Replaces every item in one go; the way to fill a long list.
     virtual void setItems(std::vector<std::string> items) = 0;
     virtual void clear() = 0;
     virtual int count() const = 0;
     virtual std::string itemText(int index) const = 0;
+    // The selected item's index, or -1 when none is selected.
+    virtual int selectedIndex() const = 0;
     virtual bool selected(int index) const = 0;
     virtual void setSelected(int index, bool selected) = 0;
     virtual void refresh() = 0;

@@ -93,10 +93,12 @@ class QtListBox : public ListBox {
   public:
     explicit QtListBox(QListWidget* list);
     void addItem(const std::string& text) override;
+    bool removeItem(const std::string& text) override;
     void setItems(std::vector<std::string> items) override;
     void clear() override;
     int count() const override { return static_cast<int>(items_.size()); }
     std::string itemText(int index) const override;
+    int selectedIndex() const override;
     bool selected(int index) const override;
     void setSelected(int index, bool selected) override;
     void refresh() override;

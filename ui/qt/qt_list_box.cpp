@@ -1,4 +1,5 @@
 // The list box on a QListWidget: its rows kept in the list boxes' own order, not the locale's.
+#include <QItemSelectionModel>
 #include <QListWidget>
 #include <algorithm>
 
@@ -23,6 +24,17 @@ void QtListBox::addItem(const std::string& text) {
     byCode_ = true;
     list_->insertItem(index, toQt(text));
     byCode_ = false;
+}
+
+bool QtListBox::removeItem(const std::string& text) {
+    const auto at = std::lower_bound(items_.begin(), items_.end(), text, list_order::itemLess);
+    if (at == items_.end() || *at != text) return false;
+    const int index = static_cast<int>(at - items_.begin());
+    items_.erase(at);
+    byCode_ = true;
+    delete list_->takeItem(index);
+    byCode_ = false;
+    return true;
 }
 
 void QtListBox::setItems(std::vector<std::string> items) {
@@ -90,6 +102,12 @@ void QtListBox::clear() {
 
 std::string QtListBox::itemText(int index) const {
     return items_.at(static_cast<std::size_t>(index));
+}
+
+int QtListBox::selectedIndex() const {
+    // Asks the selection, not every row: a long list would otherwise be walked item by item.
+    const QModelIndexList rows = list_->selectionModel()->selectedRows();
+    return rows.isEmpty() ? -1 : rows.front().row();
 }
 
 bool QtListBox::selected(int index) const {

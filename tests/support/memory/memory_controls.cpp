@@ -49,6 +49,16 @@ void MemoryListBox::addItem(const std::string& text) {
     if (selected_ >= index) ++selected_;
 }
 
+bool MemoryListBox::removeItem(const std::string& text) {
+    const auto at = std::lower_bound(items_.begin(), items_.end(), text, lessItem);
+    if (at == items_.end() || *at != text) return false;
+    const int index = static_cast<int>(at - items_.begin());
+    items_.erase(at);
+    if (selected_ == index) selected_ = -1;
+    if (selected_ > index) --selected_;
+    return true;
+}
+
 void MemoryListBox::setItems(std::vector<std::string> items) {
     list_order::sortItems(items);
     items_ = std::move(items);

@@ -73,10 +73,12 @@ class MemoryLabel : public Label {
 class MemoryListBox : public ListBox, public Owned {
   public:
     void addItem(const std::string& text) override;
+    bool removeItem(const std::string& text) override;
     void setItems(std::vector<std::string> items) override;
     void clear() override;
     int count() const override { return static_cast<int>(items_.size()); }
     std::string itemText(int index) const override;
+    int selectedIndex() const override { return selected_; }
     bool selected(int index) const override { return index == selected_; }
     void setSelected(int index, bool selected) override;
     void refresh() override { ++refreshCount_; }
@@ -85,7 +87,6 @@ class MemoryListBox : public ListBox, public Owned {
     bool userSelect(int index);
     // The user selects the item with this text.
     bool userSelect(const std::string& text);
-    int selectedIndex() const { return selected_; }
     const std::vector<std::string>& items() const { return items_; }
     int refreshCount() const { return refreshCount_; }
 
