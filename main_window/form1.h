@@ -84,6 +84,10 @@ class Form1 : public MainWindowLink {
     // up the title length and the information box. Throws CatalogueError; the list is then
     // shown empty and its entry file is not written until it loads whole.
     void LoadEntries(const std::string& name);
+    // Shows the list after an add, change or delete left it as `result` says, as LoadEntries
+    // would show it: where the one title that changed is known, only it moves in List1 and
+    // nothing is read again. Throws CatalogueError as LoadEntries does.
+    void ShowEditedEntries(const std::string& name, catalogue::EditResult& result);
 
     // Selecting an entry fills the entry fields and its article number.
     void List1_Click();

@@ -43,8 +43,7 @@ void Form1::Command_add_Click() {
             catalogue::addEntry(store_, openList(list, EntryCount), entry);
         requireDone(result);
         ArticleNumber = std::move(result.articleNumber);
-        ListText = std::move(result.entries);
-        LoadEntries(list);
+        ShowEditedEntries(list, result);
         ResetEntryFields();
     });
     c_.Text1.setFocus();
@@ -75,8 +74,7 @@ void Form1::Command_change_Click() {
             catalogue::changeEntry(store_, openList(list, EntryCount), *oldTitle, entry);
         requireDone(result);
         if (!result.articleNumber.empty()) ArticleNumber = std::move(result.articleNumber);
-        ListText = std::move(result.entries);
-        LoadEntries(list);
+        ShowEditedEntries(list, result);
         ResetEntryFields();
     });
 }
@@ -103,11 +101,10 @@ void Form1::Command_delentry_Click() {
             ResetEntryFields();
             return;
         }
-        ListText = std::move(result.entries);
         // The fields keep the deleted entry's values, so it can be added back at once; loading
         // sets up the information box, which would otherwise lose its value.
         const std::string information = c_.Combo3.text();
-        LoadEntries(list);
+        ShowEditedEntries(list, result);
         c_.Combo3.setText(information);
     });
 }

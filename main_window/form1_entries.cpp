@@ -55,6 +55,25 @@ void Form1::LoadEntries(const std::string& name) {
     wholeList_ = name;
 }
 
+void Form1::ShowEditedEntries(const std::string& name, catalogue::EditResult& result) {
+    if (wholeList_ != name || (!result.removedTitle && !result.addedTitle)) {
+        LoadEntries(name);
+        return;
+    }
+    // List1 holds this list's titles as last shown, so moving the one title keeps it equal to
+    // a refill from the file just written; loading leaves no title selected either.
+    if (const int row = c_.List1.selectedIndex(); row >= 0) c_.List1.setSelected(row, false);
+    if (result.removedTitle && !c_.List1.removeItem(*result.removedTitle)) {
+        LoadEntries(name);
+        return;
+    }
+    if (result.addedTitle) c_.List1.addItem(*result.addedTitle);
+    ListText = std::move(result.entries);
+    listStamp_ = result.stamp;
+    EntryCount = c_.List1.count();
+    c_.Label2.setCaption("... amount: " + catalogue::labelNumber(EntryCount) + " ...");
+}
+
 void Form1::List1_Click() {
     guarded(
         [&] {
@@ -83,9 +102,7 @@ void Form1::ResetEntryFields() {
     c_.Combo2.setText("Disc(s)");
     c_.Combo3.setText("Info");
     c_.Textart.setText("");
-    for (int i = 0; i < c_.List1.count(); ++i) {
-        if (c_.List1.selected(i)) c_.List1.setSelected(i, false);
-    }
+    if (const int row = c_.List1.selectedIndex(); row >= 0) c_.List1.setSelected(row, false);
 }
 
 void Form1::limitTyping(ui::ComboBox& box, std::size_t limit, int& key) {
@@ -94,11 +111,9 @@ void Form1::limitTyping(ui::ComboBox& box, std::size_t limit, int& key) {
 }
 
 std::optional<std::string> Form1::selectedTitle() const {
-    std::optional<std::string> title;
-    for (int i = 0; i < c_.List1.count(); ++i) {
-        if (c_.List1.selected(i)) title = c_.List1.itemText(i);
-    }
-    return title;
+    const int row = c_.List1.selectedIndex();
+    if (row < 0) return std::nullopt;
+    return c_.List1.itemText(row);
 }
 
 }  // namespace main_window

@@ -22,10 +22,7 @@ void TitleFinder::Text_find_Change(const std::string& text) {
 void TitleFinder::step(int direction) {
     if (needle_.empty()) return;
     const ui::ListBox& list = form_.controls().List1;
-    int current = -1;
-    for (int i = 0; i < list.count() && current < 0; ++i) {
-        if (list.selected(i)) current = i;
-    }
+    const int current = list.selectedIndex();
     // Without a selection the search starts at the top (forwards) or the bottom (backwards).
     const int start = current < 0 ? (direction > 0 ? 0 : list.count() - 1) : current + direction;
     if (!selectFrom(start, direction)) form_.platform().beep();

@@ -124,6 +124,45 @@ TEST_F(Form1Test, DeleteEntryAsksFirstAndKeepsTheDeletedValuesInTheFields) {
     EXPECT_EQ(view.List1.selectedIndex(), -1);
 }
 
+// Each add, change and delete moves one title in the list box; the list then shows exactly what
+// a refill from the written file shows, and the next change finds that file as the window left
+// it. Selecting "ABC" changes or deletes the file's first "abc" in any case, as the file says.
+TEST_F(Form1Test, AnEditedListEqualsAFullRefill) {
+    startWithRock();
+    struct Step {
+        std::string selected, title;  // add without a selection, delete without a title
+    };
+    for (const Step& step : std::vector<Step>{{"", "0 first"},
+                                              {"", "Mmm"},
+                                              {"", "zzz"},
+                                              {"", "\xC9t\xE9"},
+                                              {"xabc", "ABC"},
+                                              {"ABC", "Abc"},
+                                              {"0 first", "zzzz"},
+                                              {"\xC9t\xE9", "\xE9t\xE9"},
+                                              {"zzzz", ""},
+                                              {"ABC", ""},
+                                              {"1st", ""},
+                                              {"\xE9t\xE9", ""}}) {
+        SCOPED_TRACE(step.selected + " -> " + step.title);
+        if (!step.selected.empty()) {
+            ASSERT_TRUE(select(step.selected));
+        }
+        if (step.selected.empty()) fill({step.title, "CD", "1", ""});
+        if (!step.selected.empty() && !step.title.empty()) retype(view.Text1, step.title);
+        if (!step.selected.empty()) platform.answer(Answer::Yes);
+        (step.title.empty()      ? view.Command_delentry
+         : step.selected.empty() ? view.Command_add
+                                 : view.Command_change)
+            .click();
+        ui::memory::MemoryListBox refill;
+        refill.setItems(*catalogue::entryTitles(folder.get("Rock.dat")));
+        EXPECT_EQ(titles(), refill.items());
+        EXPECT_EQ(view.List1.selectedIndex(), -1);
+        EXPECT_EQ(view.Label2.caption(), "... amount:  " + std::to_string(refill.count()) + " ...");
+    }
+}
+
 TEST_F(Form1Test, DeletingTheOnlyEntryShowsThePlaceholder) {
     putList("Solo", entryText({{"Jazz Album", "CD", "2", "Copy"}}),
             articleText({{"Jazz Album", "J001"}}), crlf({"J#002"}), " 0 \r\n");
