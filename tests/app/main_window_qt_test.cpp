@@ -3,14 +3,9 @@
 // handlers' file effects are proven on the memory controls and in the end-to-end run.
 #include <gtest/gtest.h>
 
-#include <QComboBox>
 #include <QElapsedTimer>
 #include <QLabel>
-#include <QLineEdit>
-#include <QListWidget>
-#include <QMessageBox>
 #include <QProcess>
-#include <QPushButton>
 #include <QTest>
 #include <iostream>
 
@@ -18,28 +13,20 @@
 #include "catalogue/store.h"
 #include "main_window/form1.h"
 #include "main_window/title_finder.h"
+#include "tests/e2e/qt_user.h"
 #include "tests/support/temp_folder.h"
 #include "ui/qt/qt_platform.h"
 
 namespace {
+
+using qt_user::click;
+using qt_user::pick;
 
 struct QtMainWindow {
     explicit QtMainWindow(const test_support::TempFolder& folder)
         : store(folder.path()), form(view.controls(), platform, store) {
         view.controls().window.show();
     }
-    void select(QListWidget* list, const QString& text) {
-        const auto found = list->findItems(text, Qt::MatchExactly);
-        ASSERT_EQ(found.size(), 1) << text.toStdString();
-        list->scrollToItem(found.front());
-        QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
-                          list->visualItemRect(found.front()).center());
-    }
-    void typeInto(QWidget* widget, const QString& text) {
-        widget->setFocus();
-        QTest::keyClicks(widget, text);
-    }
-
     catalogue::Store store;
     ui::qt::QtPlatform platform;
     app::MainWindowView view;
@@ -72,12 +59,12 @@ TEST(MainWindowOnQt, ASecondRealCopyEndsAndTheFirstStillAddsThroughItsWidgets) {
     EXPECT_EQ(folder.listing() + folder.get("Music.dat") + folder.get("pemla.dat"), before);
 
     // "2" typed over the selected "Disc(s)" fits the box's limit of six.
-    w.select(w.view.List_list, QStringLiteral("Music"));
-    w.typeInto(w.view.Text1, QStringLiteral("Abbey Road"));
+    pick(w.view.List_list, QStringLiteral("Music"));
+    qt_user::retype(w.view.Text1, "Abbey Road");
     w.view.Combo1->setCurrentIndex(0);
     w.view.Combo2->lineEdit()->selectAll();
-    w.typeInto(w.view.Combo2, QStringLiteral("2"));
-    QTest::mouseClick(w.view.Command_add, Qt::LeftButton);
+    QTest::keyClicks(w.view.Combo2, QStringLiteral("2"));
+    click(w.view.Command_add);
     EXPECT_EQ(folder.get("Music.art"), "Zebra#*\\Z001\r\nAbbey Road#*\\A001\r\n");
     EXPECT_EQ(folder.get("Music.dat"),
               "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n"
@@ -108,11 +95,11 @@ TEST(MainWindowOnQt, TheLargestListOpensAndFindsQuickly) {
     QtMainWindow w(folder);
     QElapsedTimer timer;
     timer.start();
-    w.select(w.view.List_list, QStringLiteral("Big"));
+    pick(w.view.List_list, QStringLiteral("Big"));
     const qint64 openMs = timer.elapsed();
     ASSERT_EQ(w.view.List1->count(), 32767);
     timer.restart();
-    w.select(w.view.List1, w.view.List1->item(20000)->text());
+    pick(w.view.List1, w.view.List1->item(20000)->text());
     const qint64 selectMs = timer.elapsed();
 
     // The "Find title" box: each key searches every row; F3 and Shift+F3 step and wrap.
@@ -121,7 +108,7 @@ TEST(MainWindowOnQt, TheLargestListOpensAndFindsQuickly) {
     w.view.widget()->activateWindow();
     ASSERT_TRUE(QTest::qWaitForWindowActive(w.view.widget()));
     timer.restart();
-    w.typeInto(w.view.Text_find, QStringLiteral("TITLE"));
+    qt_user::retype(w.view.Text_find, "TITLE");
     const qint64 keyMs = timer.elapsed() / 5;
     std::vector<int> rows = {w.view.List1->currentRow()};
     for (auto modifier : {Qt::ShiftModifier, Qt::NoModifier}) {
@@ -142,22 +129,17 @@ TEST(MainWindowOnQt, AMissingFileStopsTheStartWithAMessage) {
     test_support::TempFolder folder;
     folder.put("type.dat", "Types\r\n");
     folder.put("pemla.dat", "");
-    std::vector<std::string> asked;
-    ui::qt::QtPlatform::setAnswerHook([&](QMessageBox& box) {
-        asked.push_back(box.text().toStdString());
-        return ui::Answer::Ok;
-    });
+    qt_user::Boxes boxes;
     {
         QtMainWindow w(folder);
         EXPECT_EQ(std::pair(w.platform.ended(), w.platform.status()), std::pair(true, 1));
         EXPECT_FALSE(w.view.widget()->isVisible());
     }
-    ui::qt::QtPlatform::setAnswerHook(nullptr);
     ui::qt::QtWindow::setEnding(false);
-    ASSERT_EQ(asked.size(), 1u);
-    EXPECT_TRUE(asked[0].find("information.dat") != std::string::npos &&
-                asked[0].find(folder.path()) != std::string::npos)
-        << asked[0];
+    ASSERT_EQ(boxes.shown.size(), 1u);
+    EXPECT_TRUE(boxes.shown[0].find("information.dat") != std::string::npos &&
+                boxes.shown[0].find(folder.path()) != std::string::npos)
+        << boxes.shown[0];
 }
 
 }  // namespace
