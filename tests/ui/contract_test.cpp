@@ -13,6 +13,7 @@
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
+#include <QTimer>
 #include <tuple>
 
 #include "tests/support/memory/memory_controls.h"
@@ -228,6 +229,23 @@ TEST(MessageStyles, StylesMapToButtonsIconsAndDefaults) {
         EXPECT_EQ(answer, yesNo ? Answer::No : Answer::Ok);
     }
     qt::QtPlatform::setAnswerHook(nullptr);
+}
+
+// Without a hook the box waits for the user, and the answer is the button pressed.
+TEST(MessageStyles, TheShownBoxAnswersTheButtonPressed) {
+    qt::QtPlatform platform;
+    for (const auto& [style, pressed, answer] : {std::tuple{4, QMessageBox::No, Answer::No},
+                                                 {4, QMessageBox::Yes, Answer::Yes},
+                                                 {16, QMessageBox::Ok, Answer::Ok}}) {
+        QTimer presser;
+        QObject::connect(&presser, &QTimer::timeout, [button = pressed] {
+            if (auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget())) {
+                box->button(button)->click();
+            }
+        });
+        presser.start(10);
+        EXPECT_EQ(platform.messageBox("Sure?", style, "Question"), answer) << style;
+    }
 }
 
 TEST(QtShortDate, IsAsciiDigitsInTheLocalesOrderNeverAMonthNameOrOtherDigits) {
