@@ -12,6 +12,7 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QTest>
+#include <QTimer>
 
 #include "app/program.h"
 #include "app/start_up.h"
@@ -128,10 +129,17 @@ TEST(Windows, At14PointsEveryControlFitsAndHasANameAndEveryButtonAnAccessKey) {
         }
     }
     QApplication::setFont(normal);
-    // Ctrl+Q does what Exit does (while no dialog has the main window disabled).
+    // Ctrl+Q does what Exit does (while no dialog has the main window disabled): the program's
+    // event loop ends with status 0. One that goes on is ended by the guard with 99.
     Windows fresh;
-    QApplication::setActiveWindow(fresh.program.mainWindow().widget());
-    QTest::keyClick(fresh.program.mainWindow().widget(), Qt::Key_Q, Qt::ControlModifier);
+    QTimer guard;
+    QObject::connect(&guard, &QTimer::timeout, [] { QApplication::exit(99); });
+    guard.start(5000);
+    QTimer::singleShot(0, [&fresh] {
+        QApplication::setActiveWindow(fresh.program.mainWindow().widget());
+        QTest::keyClick(fresh.program.mainWindow().widget(), Qt::Key_Q, Qt::ControlModifier);
+    });
+    EXPECT_EQ(QApplication::exec(), 0);
     EXPECT_TRUE(fresh.platform.ended());
     ui::qt::QtWindow::setEnding(false);
 }
