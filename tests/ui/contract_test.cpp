@@ -170,6 +170,9 @@ TYPED_TEST(ControlContract, ComboBoxKeyHandlerCanDiscardKeys) {
     this->b.selectAll();  // a key typed over the selection replaces it
     this->b.type(box, "q");
     EXPECT_EQ(box.text(), "q");
+    box.setEnabled(false);  // a disabled box takes no typing
+    this->b.type(box, "x");
+    EXPECT_EQ(std::pair(box.text(), box.isEnabled()), std::pair(std::string("q"), false));
     box.setText("assigned by code, past any limit");
     EXPECT_EQ(box.text(), "assigned by code, past any limit");
     EXPECT_EQ(box.itemCount(), 2);
