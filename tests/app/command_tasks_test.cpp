@@ -8,6 +8,7 @@
 #include <tuple>
 
 #include "app/command_line.h"
+#include "bench/catalogue_maker.h"
 #include "catalogue/entry_rules.h"
 #include "catalogue/folder_lock.h"
 #include "catalogue/records.h"
@@ -163,14 +164,12 @@ TEST_F(Commands, ImportCreatesAMissingListWithExactlyItsRowsOrRefusesTheWholeFil
 }
 
 TEST_F(Commands, ImportStopsAtTheListsCap) {
-    Rows full;
-    for (int i = 1; i < catalogue::kMaxEntries; ++i)
-        full.push_back({{"T" + std::to_string(i), "", "", ""}, {}});
-    folder.put("Rock.dat", entries(full));
+    bench::writeList(folder.path(), "Rock", catalogue::kMaxEntries - 1);
+    const std::string full = folder.get("Rock.dat");
     const Outcome r = import("Rock", "title\r\nLast\r\nOne more\r\n");
     EXPECT_EQ(r.status, 3);
     EXPECT_EQ(r.err, "pemla: " + folder.file("in.csv") + " line 3: " + catalogue::kListFull + "\n");
-    EXPECT_EQ(folder.get("Rock.dat"), entries(full) + "<|?Last\r\n<|'\r\n<||\r\n<|*\r\n");
+    EXPECT_EQ(folder.get("Rock.dat"), full + "<|?Last\r\n<|'\r\n<||\r\n<|*\r\n");
 }
 
 // Rock's titles with commas, quotes and accents go out as UTF-8 CSV in the list's order and come
