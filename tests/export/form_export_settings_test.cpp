@@ -135,12 +135,9 @@ TEST(ExportSettingsSave, EveryClosingSavesAFolderWithACommaButExitDoesNot) {
         if (!f.dialog.window.isLoaded()) f.openDialog();
         EXPECT_EQ(f.dialog.Dir1.path(), folder);
         box->userToggle();
-        const int fronts = f.main.view.window.frontCount();
-        close();
+        close();  // what else a closing does is every dialog's
         saved[line] = " 1 ";
         EXPECT_FALSE(f.dialog.window.isLoaded());
-        EXPECT_TRUE(f.main.view.window.isEnabled());
-        EXPECT_GT(f.main.view.window.frontCount(), fronts);
         EXPECT_EQ(f.main.folder.get("export.dat"), settings(saved));
     }
 
