@@ -78,9 +78,10 @@ TEST(SearchDialog, OpensOverADisabledMainWindowWithTheArticleTextReadOnce) {
     EXPECT_FALSE(d.window.isLoaded());
 
     // Reopened on another list: fresh fields, that list's text.
+    d.Text2.setText("Abbey Road");
     d.f.open("Jazz");
     ASSERT_TRUE(d.f.view.Command_search.click());
-    EXPECT_EQ(d.Text1.text(), "");
+    EXPECT_EQ(d.Text1.text() + d.Text2.text(), "");
     d.search("a001");  // the placeholder of a new list
     EXPECT_EQ(d.Text2.text(), "Add an item and delete me!");
 }
