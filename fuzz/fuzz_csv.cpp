@@ -1,30 +1,23 @@
 // Any bytes as a CSV file to import: records read back the same after writing them, and the
 // Latin-1 / UTF-8 conversions undo each other.
-#include <cstdint>
-#include <cstdlib>
-#include <string>
-
 #include "catalogue/csv.h"
+#include "fuzz/fuzz_target.h"
 
-extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-    const std::string bytes(reinterpret_cast<const char*>(data), size);
+void fuzzOne(const std::string& bytes) {
     long line = 0;
     for (const catalogue::CsvRecord& record : catalogue::parseCsv(bytes)) {
-        if (record.line <= line || record.fields.empty()) std::abort();
+        check(record.line > line && !record.fields.empty());
         line = record.line;
         // A lone empty field writes an empty line, which holds no record.
         if (record.unclosedQuote || (record.fields.size() == 1 && record.fields[0].empty())) {
             continue;
         }
         const auto again = catalogue::parseCsv(catalogue::csvRow(record.fields));
-        if (again.size() != 1 || again[0].fields != record.fields) std::abort();
+        check(again.size() == 1 && again[0].fields == record.fields);
     }
     const std::string utf8 = catalogue::latin1ToUtf8(bytes);
-    if (!catalogue::isUtf8(utf8) || catalogue::utf8ToLatin1(utf8) != bytes) std::abort();
+    check(catalogue::isUtf8(utf8) && catalogue::utf8ToLatin1(utf8) == bytes);
     // Well-formed text converts unless it holds a character above U+00FF.
     char32_t outside = 0;
-    if (catalogue::isUtf8(bytes) && !catalogue::utf8ToLatin1(bytes, &outside) && outside <= 0xFF) {
-        std::abort();
-    }
-    return 0;
+    check(!catalogue::isUtf8(bytes) || catalogue::utf8ToLatin1(bytes, &outside) || outside > 0xFF);
 }
