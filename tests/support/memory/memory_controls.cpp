@@ -42,7 +42,7 @@ void MemoryListBox::addItem(const std::string& text) {
 }
 
 bool MemoryListBox::removeItem(const std::string& text) {
-    const auto at = std::lower_bound(items_.begin(), items_.end(), text, lessItem);
+    const auto at = std::lower_bound(items_.begin(), items_.end(), text, list_order::itemLess);
     if (at == items_.end() || *at != text) return false;
     const int index = static_cast<int>(at - items_.begin());
     items_.erase(at);
