@@ -129,32 +129,22 @@ TEST_F(Form1Test, DeleteEntryAsksFirstAndKeepsTheDeletedValuesInTheFields) {
 // it. Selecting "ABC" changes or deletes the file's first "abc" in any case, as the file says.
 TEST_F(Form1Test, AnEditedListEqualsAFullRefill) {
     startWithRock();
-    struct Step {
-        std::string selected, title;  // add without a selection, delete without a title
-    };
-    for (const Step& step : std::vector<Step>{{"", "0 first"},
-                                              {"", "Mmm"},
-                                              {"", "zzz"},
-                                              {"", "\xC9t\xE9"},
-                                              {"xabc", "ABC"},
-                                              {"ABC", "Abc"},
-                                              {"0 first", "zzzz"},
-                                              {"\xC9t\xE9", "\xE9t\xE9"},
-                                              {"zzzz", ""},
-                                              {"ABC", ""},
-                                              {"1st", ""},
-                                              {"\xE9t\xE9", ""}}) {
-        SCOPED_TRACE(step.selected + " -> " + step.title);
-        if (!step.selected.empty()) {
-            ASSERT_TRUE(select(step.selected));
+    // Title selected, title typed: an add without a selection, a delete without a title.
+    const std::vector<std::pair<std::string, std::string>> steps = {
+        {"", "0 first"}, {"", "Mmm"},    {"", "zzz"},         {"", "\xC9t\xE9"},
+        {"xabc", "ABC"}, {"ABC", "Abc"}, {"0 first", "zzzz"}, {"\xC9t\xE9", "\xE9t\xE9"},
+        {"zzzz", ""},    {"ABC", ""},    {"1st", ""},         {"\xE9t\xE9", ""}};
+    for (const auto& [selected, title] : steps) {
+        SCOPED_TRACE(selected + " -> " + title);
+        if (selected.empty()) {
+            fill({title, "CD", "1", ""});
+            view.Command_add.click();
+        } else {
+            ASSERT_TRUE(select(selected));
+            if (!title.empty()) retype(view.Text1, title);
+            platform.answer(Answer::Yes);
+            (title.empty() ? view.Command_delentry : view.Command_change).click();
         }
-        if (step.selected.empty()) fill({step.title, "CD", "1", ""});
-        if (!step.selected.empty() && !step.title.empty()) retype(view.Text1, step.title);
-        if (!step.selected.empty()) platform.answer(Answer::Yes);
-        (step.title.empty()      ? view.Command_delentry
-         : step.selected.empty() ? view.Command_add
-                                 : view.Command_change)
-            .click();
         ui::memory::MemoryListBox refill;
         refill.setItems(*catalogue::entryTitles(folder.get("Rock.dat")));
         EXPECT_EQ(titles(), refill.items());
