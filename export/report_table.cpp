@@ -168,15 +168,26 @@ std::string padded(std::string_view text, std::size_t width) {
     return out;
 }
 
+std::size_t reportTableSize(std::size_t titles, const ReportOptions& options) {
+    return (titles * (options.separatorLines ? 2 : 1) + 4) * 82;
+}
+
 std::string BuildReportTable(std::string_view listName, std::string_view entryText,
                              std::string_view articleText, const std::vector<std::string>& titles,
                              const ReportOptions& options, std::string_view dateText) {
+    std::string out;
+    out.reserve(reportTableSize(titles.size(), options));
+    appendReportTable(out, listName, entryText, articleText, titles, options, dateText);
+    return out;
+}
+
+void appendReportTable(std::string& out, std::string_view listName, std::string_view entryText,
+                       std::string_view articleText, const std::vector<std::string>& titles,
+                       const ReportOptions& options, std::string_view dateText) {
     const Layout& layout = layoutFor(options);
     const EntryIndex entries(entryText);
     const ArticleIndex articles(options.articleNumbers ? articleText : std::string_view());
 
-    std::string out;
-    out.reserve((titles.size() * (options.separatorLines ? 2 : 1) + 4) * 82);
     topBorder(out, layout, listName, options, dateText);
     out.append(layout.header).append(kCrLf);
     out.append(layout.underline).append(kCrLf);
@@ -189,7 +200,6 @@ std::string BuildReportTable(std::string_view listName, std::string_view entryTe
         }
     }
     bottomLine(out, layout, options, titles.size());
-    return out;
 }
 
 }  // namespace exporting
