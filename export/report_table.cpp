@@ -1,6 +1,7 @@
 #include "export/report_table.h"
 
 #include <algorithm>
+#include <array>
 #include <string>
 
 #include "catalogue/file_text.h"
@@ -191,10 +192,22 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
     topBorder(out, layout, listName, options, dateText);
     out.append(layout.header).append(kCrLf);
     out.append(layout.underline).append(kCrLf);
+    // Each title is looked up a few rows before its row is written, so that the memory its
+    // lookups need is fetched meanwhile.
+    constexpr std::size_t kAhead = 8;
+    std::array<std::size_t, kAhead> entryHash{}, articleHash{};
+    auto fetch = [&](std::size_t i) {
+        if (i >= titles.size()) return;
+        entryHash[i % kAhead] = entries.prefetch(titles[i]);
+        if (options.articleNumbers) articleHash[i % kAhead] = articles.prefetch(titles[i]);
+    };
+    for (std::size_t i = 0; i < kAhead; ++i) fetch(i);
     for (std::size_t i = 0; i < titles.size(); ++i) {
         const std::string_view title = titles[i];
-        row(out, options, title, entries.find(title),
-            options.articleNumbers ? articles.find(title) : std::string_view());
+        const std::size_t entry = entryHash[i % kAhead], article = articleHash[i % kAhead];
+        fetch(i + kAhead);
+        row(out, options, title, entries.find(title, entry),
+            options.articleNumbers ? articles.find(title, article) : std::string_view());
         if (options.separatorLines && i + 1 < titles.size()) {
             out.append(layout.underline).append(kCrLf);
         }

@@ -25,8 +25,9 @@ struct Fields {
     std::string_view information;
 };
 
-// Titles to values in one array found through open addressing: built once per report, it
-// costs no allocation per title. The first value put in for a title stays.
+// Titles to values found through open addressing: built once per report, it costs no
+// allocation per title. A slot is eight bytes (part of the hash, and which record), so the table
+// of a full list stays in the processor's cache. The first value put in for a title stays.
 template <typename Value, typename Hash, typename Equal>
 class FlatTitleMap {
   public:
@@ -34,48 +35,66 @@ class FlatTitleMap {
         std::size_t size = 64;
         while (size < expected * 2) size *= 2;
         slots_.resize(size);
+        records_.reserve(expected);
     }
 
     void putFirst(std::string_view title, const Value& value) {
         const std::size_t hash = Hash{}(title);
         std::size_t i = hash & (slots_.size() - 1);
-        for (; slots_[i].used; i = (i + 1) & (slots_.size() - 1)) {
-            if (slots_[i].hash == hash && Equal{}(slots_[i].title, title)) return;
+        for (; slots_[i] != 0; i = (i + 1) & (slots_.size() - 1)) {
+            if (matches(slots_[i], hash, title)) return;
         }
-        slots_[i] = {title, value, hash, true};
-        if (++count_ * 2 > slots_.size()) grow();
+        // Records are counted in 32 bits: a text holding 2^32 titles would not fit in memory.
+        records_.push_back({title, value});
+        slots_[i] = tagOf(hash) | records_.size();
+        if (records_.size() * 2 > slots_.size()) grow();
     }
 
-    const Value* find(std::string_view title) const {
+    // The hash of a title, its slot fetched into the cache meanwhile, for find().
+    std::size_t prefetch(std::string_view title) const {
         const std::size_t hash = Hash{}(title);
-        for (std::size_t i = hash & (slots_.size() - 1); slots_[i].used;
+        __builtin_prefetch(&slots_[hash & (slots_.size() - 1)]);
+        return hash;
+    }
+
+    // The value of `title`, whose hash is `hash`; nothing when it has none.
+    const Value* find(std::string_view title, std::size_t hash) const {
+        for (std::size_t i = hash & (slots_.size() - 1); slots_[i] != 0;
              i = (i + 1) & (slots_.size() - 1)) {
-            if (slots_[i].hash == hash && Equal{}(slots_[i].title, title)) return &slots_[i].value;
+            if (matches(slots_[i], hash, title))
+                return &records_[(slots_[i] & 0xFFFFFFFFu) - 1].value;
         }
         return nullptr;
     }
 
   private:
-    struct Slot {
+    struct Record {
         std::string_view title;
-        Value value{};
-        std::size_t hash = 0;
-        bool used = false;
+        Value value;
     };
 
+    static std::uint64_t tagOf(std::size_t hash) {
+        return static_cast<std::uint64_t>(hash) >> 32 << 32;
+    }
+    bool matches(std::uint64_t slot, std::size_t hash, std::string_view title) const {
+        return (slot >> 32 << 32) == tagOf(hash) &&
+               Equal{}(records_[(slot & 0xFFFFFFFFu) - 1].title, title);
+    }
+
     void grow() {
-        std::vector<Slot> old(slots_.size() * 2);
+        std::vector<std::uint64_t> old(slots_.size() * 2);
         old.swap(slots_);
-        for (const Slot& s : old) {
-            if (!s.used) continue;
-            std::size_t i = s.hash & (slots_.size() - 1);
-            while (slots_[i].used) i = (i + 1) & (slots_.size() - 1);
-            slots_[i] = s;
+        for (const std::uint64_t slot : old) {
+            if (slot == 0) continue;
+            const std::size_t hash = Hash{}(records_[(slot & 0xFFFFFFFFu) - 1].title);
+            std::size_t i = hash & (slots_.size() - 1);
+            while (slots_[i] != 0) i = (i + 1) & (slots_.size() - 1);
+            slots_[i] = slot;
         }
     }
 
-    std::vector<Slot> slots_;
-    std::size_t count_ = 0;
+    std::vector<std::uint64_t> slots_;  // hash's high half, then record + 1; 0 when free
+    std::vector<Record> records_;
 };
 
 // Every title line of an entry text, looked up by its exact title; the first one wins, as a
@@ -93,8 +112,12 @@ class EntryIndex {
         }
     }
 
-    Fields find(std::string_view title) const {
-        const std::size_t* hit = titles_.find(title);
+    // Starts looking for `title`: its hash, for find().
+    std::size_t prefetch(std::string_view title) const { return titles_.prefetch(title); }
+
+    Fields find(std::string_view title) const { return find(title, titles_.prefetch(title)); }
+    Fields find(std::string_view title, std::size_t hash) const {
+        const std::size_t* hit = titles_.find(title, hash);
         if (hit == nullptr) return {};
         std::size_t from = *hit + 1;  // past the title's own marker, which is none of the others
         Fields fields;
@@ -198,8 +221,14 @@ class ArticleIndex {
         }
     }
 
+    // Starts looking for `title`: its hash, for find().
+    std::size_t prefetch(std::string_view title) const { return numbers_.prefetch(title); }
+
     std::string_view find(std::string_view title) const {
-        const std::string_view* hit = numbers_.find(title);
+        return find(title, numbers_.prefetch(title));
+    }
+    std::string_view find(std::string_view title, std::size_t hash) const {
+        const std::string_view* hit = numbers_.find(title, hash);
         return hit == nullptr ? std::string_view() : *hit;
     }
 
