@@ -15,7 +15,6 @@
 
 #include "app/main_window_view.h"
 #include "bench/bench_world.h"
-#include "bench/catalogue_maker.h"
 #include "catalogue/store.h"
 #include "main_window/form1.h"
 #include "ui/qt/qt_platform.h"

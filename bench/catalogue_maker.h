@@ -2,7 +2,7 @@
 
 #include <string>
 
-// Writes realistic generated catalogues for the benchmark.
+// Realistic generated catalogues for the benchmark, and for the tests of a list at its largest.
 namespace bench {
 
 // A list of `entries` titles with every first letter in use (digits and accents too), its article

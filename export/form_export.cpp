@@ -38,8 +38,8 @@ std::string resolved(const std::string& folder) {
 }  // namespace
 
 Form_Export::Form_Export(const Form_ExportControls& controls, ui::Platform& platform,
-                         catalogue::Store& store, main_window::Form1& form1)
-    : c_(controls), platform_(platform), store_(store), form1_(form1) {
+                         catalogue::Store& store, main_window::MainWindowLink& main)
+    : MainWindowDialog(controls.window, main), c_(controls), platform_(platform), store_(store) {
     c_.window.setCaption(kForm_ExportCaption);
     c_.Label1.setCaption("Output path:");
     c_.Command1.setCaption("Export");
@@ -57,25 +57,19 @@ Form_Export::Form_Export(const Form_ExportControls& controls, ui::Platform& plat
     c_.Combo1.setItems({"Top", "Bottom"});
     c_.Check_noinfo.setCaption("Don't include information");
 
-    c_.window.onLoad = [this] { Form_Load(); };
-    c_.window.onUnload = [this] { Form_Unload(); };
     c_.Command1.onClick = [this] { Command1_Click(); };
     c_.Command2.onClick = [this] { Command2_Click(); };
     c_.Drive1.onChange = [this] { Drive1_Change(); };
 }
 
 void Form_Export::Form_Load() {
-    form1_.controls().window.setEnabled(false);
     // The hidden box follows the list of each run; it starts cleared at every opening.
     c_.Check_noinfo.setValue(0);
     LoadSettings();
 }
 
 void Form_Export::Form_Unload() {
-    form1_.guarded([this] { SaveSettings(); });
-    ui::Window& main = form1_.controls().window;
-    main.setEnabled(true);
-    main.bringToFront();
+    main_.guarded([this] { SaveSettings(); });
 }
 
 void Form_Export::Drive1_Change() {
@@ -149,7 +143,7 @@ void Form_Export::SaveSettings() {
 }
 
 std::string Form_Export::BuildReport(const std::string& list) {
-    const ui::ListBox& titlesBox = form1_.controls().List1;
+    const ui::ListBox& titlesBox = main_.titles();
     std::vector<std::string> titles;
     titles.reserve(static_cast<std::size_t>(titlesBox.count()));
     for (int i = 0; i < titlesBox.count(); ++i) titles.push_back(titlesBox.itemText(i));
@@ -177,7 +171,7 @@ std::string Form_Export::BuildReport(const std::string& list) {
 void Form_Export::RunExport() {
     {
         const DisabledWhileRunning disabled(c_.window);
-        const std::string list = form1_.selectedList();
+        const std::string list = main_.selectedList();
         if (list.empty()) {
             platform_.beep();
             return;
@@ -194,7 +188,7 @@ void Form_Export::RunExport() {
                                reportFileBytes(list, std::move(report), html));
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);
-            form1_.showError(error.file(), error.reason());
+            main_.showError(error.file(), error.reason());
             return;
         }
     }

@@ -5,7 +5,7 @@
 
 #include "catalogue/store.h"
 #include "export/export_settings.h"
-#include "main_window/form1.h"
+#include "main_window/main_window_link.h"
 #include "ui/controls.h"
 #include "ui/platform.h"
 
@@ -38,18 +38,18 @@ inline constexpr const char* kForm_ExportCaption = "Export list";
 inline constexpr std::string_view kCreditText = "Exported from the disc catalogue, v. 0.90";
 static_assert(kCreditText.size() == 41);
 
-class Form_Export {
+class Form_Export : public main_window::MainWindowDialog {
   public:
     // Sets the captions and initial texts and wires every event to its handler.
     Form_Export(const Form_ExportControls& controls, ui::Platform& platform,
-                catalogue::Store& store, main_window::Form1& form1);
+                catalogue::Store& store, main_window::MainWindowLink& main);
 
     const Form_ExportControls& controls() const { return c_; }
 
-    // Opening: the main window is disabled and the settings are loaded.
-    void Form_Load();
-    // Every closing: the settings are saved, the main window enabled and brought to the front.
-    void Form_Unload();
+    // Opening: the settings are loaded.
+    void Form_Load() override;
+    // Every closing saves the settings.
+    void Form_Unload() override;
     // "Export".
     void Command1_Click() { RunExport(); }
     // "Cancel" closes the dialog, which saves the settings.
@@ -84,7 +84,6 @@ class Form_Export {
     Form_ExportControls c_;
     ui::Platform& platform_;
     catalogue::Store& store_;
-    main_window::Form1& form1_;
     bool loading_ = false;
     bool restoringDrive_ = false;
 };

@@ -199,12 +199,6 @@ void Form1::guarded(const std::function<void()>& body, bool busy) {
     if (!prompt.empty()) platform_.messageBox(prompt, ui::kCritical, "Error");
 }
 
-void Form1::finishEarlierChange() {
-    if (store_.settle()) {
-        throw catalogue::ChangedOnDisk(std::string(catalogue::kJournalName), "it was finished");
-    }
-}
-
 void Form1::showFilesAgain() {
     const std::string list = selectedList();
     const std::optional<std::string> title = selectedTitle();

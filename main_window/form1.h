@@ -6,8 +6,10 @@
 #include <string>
 
 #include "catalogue/folder_lock.h"
+#include "catalogue/list_edits.h"
 #include "catalogue/records.h"
 #include "catalogue/store.h"
+#include "main_window/main_window_link.h"
 #include "ui/controls.h"
 #include "ui/platform.h"
 
@@ -50,7 +52,7 @@ inline constexpr const char* kNoAmount = "... amount ...";
 // One space, "Title", 62 spaces, "Type", 41 spaces, "CD's", 13 spaces, "Information".
 extern const std::string kColumnHeader;
 
-class Form1 {
+class Form1 : public MainWindowLink {
   public:
     // Sets the captions and initial texts and wires every event to its handler.
     Form1(const Form1Controls& controls, ui::Platform& platform, catalogue::Store& store);
@@ -69,7 +71,7 @@ class Form1 {
     void Form_Unload();
 
     // Refills List_list from the list index and empties List1. Throws CatalogueError.
-    void LoadListNames();
+    void LoadListNames() override;
 
     void Command_create_Click();
     void Command_export_Click();
@@ -100,29 +102,22 @@ class Form1 {
     // file, and they have it. Throws CatalogueError when the flag file cannot be read.
     bool HasInformation(const std::string& list);
 
-    // Plans the next article number for a title's first character in the list's counter file,
-    // read within `t`, and sets ArticleNumber. Refuses (nothing planned) when the letter's
-    // numbers are used up.
-    void NextArticleNumber(char firstCharacter, const std::string& list, catalogue::Transaction& t);
-    // Plans the empty-list skeleton for a list's entry, article and counter files.
-    static void WriteEmptyList(const std::string& name, catalogue::Transaction& t);
-
     // The selected list's name, or an empty text when none is selected.
-    std::string selectedList() const;
+    std::string selectedList() const override;
+    const ui::ListBox& titles() const override { return c_.List1; }
+    void setEnabled(bool enabled) override { c_.window.setEnabled(enabled); }
+    void bringToFront() override { c_.window.bringToFront(); }
 
-    // A refusal the user is told about in a message box (title "Error", style 16).
-    struct Refusal {
-        std::string prompt;
-    };
+    using Refusal = main_window::Refusal;
 
     // Runs a handler body, with the busy pointer when asked; a catalogue failure is shown as a
     // message naming the file and the reason, a Refusal as its prompt, and the window stays
     // usable. When the files on disk are no longer the ones the window shows (changed behind its
     // back, or a change left unfinished), the window shows them again as they are now. The busy
     // pointer is off before any message shows.
-    void guarded(const std::function<void()>& body, bool busy = false);
+    void guarded(const std::function<void()>& body, bool busy = false) override;
     // Shows a catalogue failure the way every handler does.
-    void showError(const std::string& file, const std::string& reason);
+    void showError(const std::string& file, const std::string& reason) override;
 
     // State of the open list.
     std::string ListText;
@@ -134,15 +129,15 @@ class Form1 {
     void limitTyping(ui::ComboBox& box, std::size_t limit, int& key);
     // The fields as an entry, refused when a value could not be stored safely.
     catalogue::Entry fieldsAsEntry() const;
+    // The open list as the changes to `list` are computed from it.
+    catalogue::OpenList openList(const std::string& list, int titles) const;
     // The selected row of List1, or nothing.
     std::optional<std::string> selectedTitle() const;
-    // Refuses to write `list`'s entry file unless ListText came whole from it.
-    void requireWholeList(const std::string& list) const;
     // Reads the lists and the open list again, keeping the selections and the typed fields.
     void showFilesAgain();
     // Every change starts here: a change left unfinished is finished first, and when that moved
     // files the window shows is refused (ChangedOnDisk naming the journal) and shows them again.
-    void finishEarlierChange();
+    void finishEarlierChange() { catalogue::finishEarlierChange(store_); }
 
     // The list whose entry file ListText holds whole; empty after a failed or no load.
     std::string wholeList_;

@@ -2,7 +2,7 @@
 
 #include "catalogue/entry_rules.h"
 #include "catalogue/store.h"
-#include "main_window/form1.h"
+#include "main_window/main_window_link.h"
 #include "ui/controls.h"
 #include "ui/platform.h"
 
@@ -24,17 +24,15 @@ using catalogue::kBadName;
 using catalogue::kMaxNameLength;
 using catalogue::kNameInUse;
 
-class Form_new_list {
+class Form_new_list : public main_window::MainWindowDialog {
   public:
     // Sets the captions and the name limit and wires the dialog's events to its handlers.
     Form_new_list(const Form_new_listControls& controls, ui::Platform& platform,
-                  catalogue::Store& store, main_window::Form1& form1);
+                  catalogue::Store& store, main_window::MainWindowLink& main);
 
-    // Opening: the main window is disabled; the name box starts empty and the information
-    // column is chosen, with the focus in the name box.
-    void Form_Load();
-    // Every closing: the main window is enabled again and brought to the front.
-    void Form_Unload();
+    // Opening: the name box starts empty and the information column is chosen, with the focus
+    // in the name box.
+    void Form_Load() override;
 
     // "Create": tries the name, refuses one in use or reserved, otherwise writes the index line
     // and the new list's files as one change and refills the main window's lists. Refusals and
@@ -49,7 +47,6 @@ class Form_new_list {
     Form_new_listControls c_;
     ui::Platform& platform_;
     catalogue::Store& store_;
-    main_window::Form1& form1_;
 };
 
 }  // namespace new_list

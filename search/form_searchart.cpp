@@ -25,39 +25,33 @@ std::optional<std::string> titleBefore(std::string_view articleText, std::string
 }
 
 Form_searchart::Form_searchart(const Form_searchartControls& controls, ui::Platform& platform,
-                               catalogue::Store& store, main_window::Form1& form1)
-    : c_(controls), platform_(platform), store_(store), form1_(form1) {
+                               catalogue::Store& store, main_window::MainWindowLink& main)
+    : MainWindowDialog(controls.window, main), c_(controls), platform_(platform), store_(store) {
     c_.window.setCaption(kSearchCaption);
     c_.Text1.setMaxLength(4);
     c_.Label1.setCaption(kSearchHint);
     c_.Command_search.setCaption("Search");
     c_.Command_cancel.setCaption("Cancel");
 
-    c_.window.onLoad = [this] { Form_Load(); };
-    c_.window.onUnload = [this] { Form_Unload(); };
     c_.Command_search.onClick = [this] { Command_search_Click(); };
     c_.Command_cancel.onClick = [this] { Command_cancel_Click(); };
 }
 
 void Form_searchart::Form_Load() {
-    form1_.controls().window.setEnabled(false);
     c_.Text1.setText("");
     c_.Text2.setText("");
     c_.Text1.setFocus();
     try {
-        ArticleText = "\r\n" + store_.readText(catalogue::articleFile(form1_.selectedList()));
+        ArticleText = "\r\n" + store_.readText(catalogue::articleFile(main_.selectedList()));
     } catch (const catalogue::CatalogueError& error) {
         ArticleText.clear();
-        form1_.showError(error.file(), error.reason());
+        main_.showError(error.file(), error.reason());
         c_.window.unload();
     }
 }
 
 void Form_searchart::Form_Unload() {
     ArticleText.clear();
-    ui::Window& main = form1_.controls().window;
-    main.setEnabled(true);
-    main.bringToFront();
 }
 
 void Form_searchart::Command_search_Click() {

@@ -5,7 +5,7 @@
 #include <string_view>
 
 #include "catalogue/store.h"
-#include "main_window/form1.h"
+#include "main_window/main_window_link.h"
 #include "ui/controls.h"
 #include "ui/platform.h"
 
@@ -31,17 +31,17 @@ inline constexpr const char* kNotFound = "Can't found that article number!";
 // first four characters of its line. Nothing when `number` is empty or does not occur.
 std::optional<std::string> titleBefore(std::string_view articleText, std::string_view number);
 
-class Form_searchart {
+class Form_searchart : public main_window::MainWindowDialog {
   public:
     // Sets the captions and the number limit and wires the dialog's events to its handlers.
     Form_searchart(const Form_searchartControls& controls, ui::Platform& platform,
-                   catalogue::Store& store, main_window::Form1& form1);
+                   catalogue::Store& store, main_window::MainWindowLink& main);
 
-    // Opening: the main window is disabled and the selected list's article file is read once.
-    // When it cannot be read, a message names the file and the dialog closes again.
-    void Form_Load();
-    // Every closing: the main window is enabled again and brought to the front.
-    void Form_Unload();
+    // Opening: the selected list's article file is read once. When it cannot be read, a message
+    // names the file and the dialog closes again.
+    void Form_Load() override;
+    // Every closing forgets the article text.
+    void Form_Unload() override;
 
     // "Search": shows the title found in Text2, or a message leaving Text2 as it was.
     void Command_search_Click();
@@ -55,7 +55,6 @@ class Form_searchart {
     Form_searchartControls c_;
     ui::Platform& platform_;
     catalogue::Store& store_;
-    main_window::Form1& form1_;
 };
 
 }  // namespace search

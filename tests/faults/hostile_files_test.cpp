@@ -30,7 +30,8 @@ std::string highBytes(int count) {
 struct Damage {
     const char* name;
     const char* file;
-    // Its bytes, or as a snapshot shows them "[folder]" or "[link to X]"; or "[missing]".
+    // Its bytes, or as a snapshot shows them "[folder]" or "[link to X]"; or "[missing]", or
+    // "[protected]": as put, with every write permission bit cleared (refused even as root).
     std::string bytes;
     // The file is named in an error box and nothing changes; otherwise it is data to keep.
     bool refused;
@@ -89,6 +90,9 @@ const Damage kDamages[] = {
      }},
     {"DeletingAListWhoseArticleFileIsAFolder", "Rock.art", "[folder]", true, deleteRock,
      "Rock\r\nJazz\r\n"},
+    {"AProtectedArticleFile", "Rock.art", "[protected]", true},
+    {"DeletingAListWithAProtectedFile", "Rock.art", "[protected]", true, deleteRock,
+     "Rock\r\nJazz\r\n"},
     {"CreatingAListWhoseCounterFileIsAFolder", "Blues.arn", "[folder]", true,
      [](Rig& r) {
          r.platform.answer(Answer::Ok);
@@ -102,17 +106,19 @@ TEST_P(DamagedList, IsKeptByteForByteOrNamedAndLeftAlone) {
     const Damage& d = GetParam();
     Rig r;
     r.putRock(d.index);
-    const std::string path = r.folder + "/" + d.file;
-    fs::remove(path);
-    fs::create_directory(r.folder + "/elsewhere");
+    const std::string path = r.folder.path() + "/" + d.file;
+    if (d.bytes != "[protected]") fs::remove(path);
+    fs::create_directory(r.folder.path() + "/elsewhere");
     if (d.bytes == "[folder]") {
         fs::create_directory(path);
     } else if (d.bytes == "[fifo]") {
         ASSERT_EQ(::mkfifo(path.c_str(), 0644), 0);
     } else if (d.bytes.starts_with("[link to ")) {
         fs::create_symlink(d.bytes.substr(9, d.bytes.size() - 10), path);
+    } else if (d.bytes == "[protected]") {
+        ASSERT_EQ(::chmod(path.c_str(), 0444), 0);
     } else if (d.bytes != "[missing]") {
-        r.put(d.file, d.bytes);
+        r.folder.put(d.file, d.bytes);
     }
     const Files before = r.files();
     const auto started = std::chrono::steady_clock::now();
@@ -171,14 +177,14 @@ INSTANTIATE_TEST_SUITE_P(Files, DamagedList, ::testing::ValuesIn(kDamages),
 TEST(HostileIndex, NamesThatAreNoFileNamesAreRefusedAndNoOtherFileIsTouched) {
     Rig r;
     r.putRock();
-    fs::create_directory(r.folder + "/sub");
-    r.put("sub/inner.dat", kAbbaDat);
+    fs::create_directory(r.folder.path() + "/sub");
+    r.folder.put("sub/inner.dat", kAbbaDat);
     const std::string names[] = {std::string("pemla.dat\0", 10),
-                                 "../" + fs::path(r.folder).filename().string() + "/Rock",
+                                 "../" + fs::path(r.folder.path()).filename().string() + "/Rock",
                                  "sub/inner", std::string(1 << 20, 'n')};
     for (const std::string& name : names) {
         SCOPED_TRACE(name.substr(0, 24));
-        r.put("pemla.dat", crlf({"Rock", name}));
+        r.folder.put("pemla.dat", crlf({"Rock", name}));
         const Files before = r.files();
         const std::size_t boxes = r.errors().size();
         const auto started = std::chrono::steady_clock::now();
@@ -195,7 +201,7 @@ TEST(HostileIndex, NamesThatAreNoFileNamesAreRefusedAndNoOtherFileIsTouched) {
                 << errors[i].prompt.substr(0, 80);
         }
         EXPECT_EQ(r.files(), before) << difference(before, r.files());
-        EXPECT_EQ(snapshot(r.folder + "/sub"), (Files{{"inner.dat", kAbbaDat}}));
+        EXPECT_EQ(snapshot(r.folder.path() + "/sub"), (Files{{"inner.dat", kAbbaDat}}));
     }
 }
 
@@ -242,9 +248,9 @@ TEST_P(StartUp, FinishesACompleteJournalAndDropsEverythingElseItLeft) {
         expected["Rock.dat"] = kNewRockDat;
         expected.erase("Rock.inf");
     }
-    for (const auto& [name, bytes] : l.files) r.put(name, bytes);
+    for (const auto& [name, bytes] : l.files) r.folder.put(name, bytes);
     if (l.unreadable) {
-        fs::create_directory(r.folder + "/" + kJournalName);
+        fs::create_directory(r.folder.path() + "/" + kJournalName);
         expected = r.files();
         r.platform.answer(Answer::Ok);
     }

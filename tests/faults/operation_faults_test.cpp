@@ -30,7 +30,7 @@ struct Operation {
 
 // The user types an entry and presses the button.
 void type(Rig& r, const char* title, ui::memory::MemoryButton& button) {
-    r.fill(title, "Game", "3", "Copy");
+    r.fill({title, "Game", "3", "Copy"});
     button.click();
 }
 void deleteEntry(Rig& r) {
@@ -50,7 +50,7 @@ void writeReport(Rig& r) {
 }
 // An import as the command runs it, its failures shown as the command prints them.
 void importRows(Rig& r, const char* list) {
-    r.form.guarded([&] {
+    r.form->guarded([&] {
         const std::string rows = "title,type\r\nDylan,LP\r\nBlur,dup\r\n\"Zappa, Frank\",CD\r\n";
         const catalogue::ImportResult result = catalogue::importCsv(r.store, list, rows);
         if (!result.problem.empty()) r.platform.messageBox(result.problem, 16, "Error");
@@ -100,12 +100,12 @@ void setUp(Rig& r, const Operation& op) {
               std::string(catalogue::kSkeletonArticles), "A#001\r\n");
     r.putList("Solo", entryText({{"Miles", "Music CD", "1", "Original"}}), crlf({"Miles#*\\M001"}),
               crlf({"M#002"}));
-    r.put("pemla.dat", op.onlyList ? crlf({"Solo"}) : crlf({"Rock", "Jazz", "Solo"}));
+    r.folder.put("pemla.dat", op.onlyList ? crlf({"Solo"}) : crlf({"Rock", "Jazz", "Solo"}));
     const char* html = op.exportDialog == 1 ? "1" : "0";
-    r.put("export.dat", crlf({r.out, "0", html, "0", "0", "0", "0", "10", "Top"}));
+    r.folder.put("export.dat", crlf({r.out->path(), "0", html, "0", "0", "0", "0", "10", "Top"}));
     if (op.earlierBuild) {
         r.putList("B\xFChne", kAbbaDat, crlf({"Abba Gold#*\\A001"}), crlf({"A#002"}));
-        r.put("pemla.dat", crlf({"Rock", "B\xFChne"}));
+        r.folder.put("pemla.dat", crlf({"Rock", "B\xFChne"}));
         return;  // the start is the operation
     }
     r.start();
@@ -170,7 +170,7 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
                 EXPECT_EQ(left, after) << difference(left, after);
                 break;
             }
-            catalogue::Store(r.folder).recover();
+            catalogue::Store(r.folder.path()).recover();
             Files now = r.files();
             dropStrays(left);
             EXPECT_FALSE(dropStrays(now)) << "a stray file after the start";
@@ -184,7 +184,7 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
                 const std::string file = namedFile(errors.front().prompt);
                 EXPECT_TRUE(file.empty() || before.contains(file) || after.contains(file) ||
                             after.contains("out/" + file) || file == catalogue::kJournalName ||
-                            file == r.folder || file == r.out)
+                            file == r.folder.path() || file == r.out->path())
                     << errors.front().prompt;
                 runAction(r, op, false);
                 Files retried = r.files();
@@ -221,7 +221,7 @@ TEST_P(OperationFaults, AKillAtAnyStepRecoversToTheOldOrTheNewFiles) {
             runAction(r, op, false);
         });
         // What the program does first when it starts again.
-        catalogue::Store(r.folder).recover();
+        catalogue::Store(r.folder.path()).recover();
         Files now = r.files();
         if (!killed(status)) {
             // The operation ran to its end before the step came.
@@ -252,7 +252,7 @@ TEST_P(OpenListOperations, AFileChangedBehindTheWindowIsNeverReplaced) {
         setUp(r, op);
         const std::string behind = file == "pemla.dat" ? crlf({"Rock", "Jazz", "Solo", "Blues"})
                                                        : entryText({{"Behind", "CD", "1", "x"}});
-        r.put(file, r.files().at(file) + behind);
+        r.folder.put(file, r.files().at(file) + behind);
         const Files before = r.files();
         runAction(r, op, true);
         EXPECT_EQ(r.files(), before) << difference(before, r.files());
@@ -274,7 +274,7 @@ class WindowOperations : public OperationFaults {};
 TEST_P(WindowOperations, TwoFailuresPastTheCommitPointThenAnotherOperationLeaveAWholeCatalogue) {
     const Operation& op = GetParam();
     const auto addDylanToRock = [](Rig& r) {
-        r.open("Rock");
+        r.view.List_list.userSelect("Rock");  // gone where the operation deleted it
         for (int i = 0; i < 5; ++i) r.addDylan();
     };
     Files withOp, withoutOp;
@@ -298,7 +298,7 @@ TEST_P(WindowOperations, TwoFailuresPastTheCommitPointThenAnotherOperationLeaveA
             addDylanToRock(r);
             // Only where Rock is listed did a write come after the failures to finish the journal.
             EXPECT_TRUE(op.onlyList || !hasLeftovers(r.files())) << "something half-done is left";
-            catalogue::Store(r.folder).recover();
+            catalogue::Store(r.folder.path()).recover();
             const Files now = r.files();
             EXPECT_TRUE(now == withOp || now == withoutOp)
                 << difference(withOp, now) << " /" << difference(withoutOp, now)

@@ -38,11 +38,11 @@ void work(const std::string& folder, unsigned seed, int round, long* done) {
         const std::vector<std::string> titles = r.view.List1.items();
         const unsigned what = rng() % 10;
         if (what < 4) {
-            r.fill(title, "Game", "1", "Copy");
+            r.fill({title, "Game", "1", "Copy"});
             r.view.Command_add.click();
         } else if (what < 6 && r.select(pick(titles))) {
             r.platform.answer(Answer::Yes);
-            r.fill(title, "DVD video", "2", "Original");
+            r.fill({title, "DVD video", "2", "Original"});
             r.view.Command_change.click();
         } else if (what < 8 && r.select(pick(titles))) {
             r.platform.answer(Answer::Yes);
@@ -114,12 +114,12 @@ TEST(Soak, KilledAtRandomMomentsTheCatalogueAlwaysStartsWhole) {
     while (std::chrono::steady_clock::now() - start < kBudget && !HasFailure()) {
         const unsigned seed = rng();
         const int delay = 1 + static_cast<int>(rng() % 50);
-        const int status = inChild([&] { work(base.folder, seed, kills, done); }, delay);
+        const int status = inChild([&] { work(base.folder.path(), seed, kills, done); }, delay);
         ASSERT_TRUE(killed(status)) << "round " << kills << ", wait status " << status;
         ++kills;
         // A kill in the middle of a commit leaves its staged files or journal behind.
-        midway += hasLeftovers(snapshot(base.folder)) ? 1 : 0;
-        expectWhole(base.folder);
+        midway += hasLeftovers(snapshot(base.folder.path())) ? 1 : 0;
+        expectWhole(base.folder.path());
     }
     std::cout << "[ faults ] soak (seed " << kSeed << "): " << kills << " kills (" << midway
               << " in the middle of a commit) over " << *done << " finished operations\n";

@@ -14,18 +14,18 @@ TEST_F(Form1Test, FindSelectsMatchingTitlesInTurnAndNeverHidesOne) {
         "CR\xC8ME fra\xEE"
         "che";
     putList("Mix",
-            entries({{"Zappa", "CD", "1", "z"},
-                     {"abba live", "LP", "2", "l"},
-                     {creme, "DVD", "3", "c"},
-                     {"Blur", "Game", "4", "b"},
-                     {fraiche, "CD", "5", "f"},
-                     {"Abba Gold", "CD", "6", "g"}}),
-            articles({{"Zappa", "Z001"},
-                      {"abba live", "A001"},
-                      {creme, "!001"},
-                      {"Blur", "B001"},
-                      {fraiche, "!002"},
-                      {"Abba Gold", "A002"}}));
+            entryText({{"Zappa", "CD", "1", "z"},
+                       {"abba live", "LP", "2", "l"},
+                       {creme, "DVD", "3", "c"},
+                       {"Blur", "Game", "4", "b"},
+                       {fraiche, "CD", "5", "f"},
+                       {"Abba Gold", "CD", "6", "g"}}),
+            articleText({{"Zappa", "Z001"},
+                         {"abba live", "A001"},
+                         {creme, "!001"},
+                         {"Blur", "B001"},
+                         {fraiche, "!002"},
+                         {"Abba Gold", "A002"}}));
     folder.put("pemla.dat", crlf({"Mix"}));
     start();
     open("Mix");

@@ -30,17 +30,6 @@ TEST_F(Form1Test, StartUpFillsTheBoxesButNeverOffersASuggestionFilesFirstLine) {
     EXPECT_FALSE(platform.ended());
 }
 
-TEST_F(Form1Test, OneLineSuggestionFilesAndAnEmptyIndexStartWithEmptyBoxes) {
-    folder.put("type.dat", "Types\r\n");
-    folder.put("information.dat", "Information, no line end");
-    start();
-    EXPECT_EQ(view.Combo1.itemCount(), 0);
-    EXPECT_EQ(view.Combo3.itemCount(), 0);
-    EXPECT_EQ(view.List_list.count(), 0);
-    EXPECT_FALSE(platform.ended());
-    EXPECT_TRUE(platform.shown().empty());
-}
-
 // An earlier build named a list's files with the Latin-1 bytes of its name. At the start they
 // take their UTF-8 names, bytes untouched, and the list works on as before.
 TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
@@ -48,19 +37,19 @@ TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
     const std::string latin1 = "B\xFChne", utf8 = "B\xC3\xBChne";
     folder.put("pemla.dat", crlf({"Rock", latin1}));
     for (const std::string ending : {".dat", ".art", ".arn", ".inf", ".top"})
-        folder.put(latin1 + ending, ending == ".dat"   ? entries(rock)
+        folder.put(latin1 + ending, ending == ".dat"   ? entryText(rock)
                                     : ending == ".inf" ? " 1 "
                                                        : ending);
     folder.put(utf8 + ".top", "newer");  // a file of the new name is never replaced
-    Files old = snapshot();
+    Files old = files();
     for (const std::string ending : {".dat", ".art", ".arn", ".inf"})
         old[utf8 + ending] = old.extract(latin1 + ending).mapped();
     start();
-    EXPECT_EQ(snapshot(), old);
+    EXPECT_EQ(files(), old);
     open(latin1);
     fill({"New", "CD", "1", "x"});
     view.Command_add.click();
-    EXPECT_EQ(folder.get(utf8 + ".dat"), entries(rock) + entries({{"New", "CD", "1", "x"}}));
+    EXPECT_EQ(folder.get(utf8 + ".dat"), entryText(rock) + entryText({{"New", "CD", "1", "x"}}));
     EXPECT_TRUE(platform.shown().empty());
 }
 
@@ -100,7 +89,7 @@ TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) 
         SCOPED_TRACE(std::string(c.file) + (c.bytes == nullptr ? " missing" : " empty"));
         test_support::MainWindowFixture fresh;
         if (c.bytes == nullptr) {
-            std::filesystem::remove(fresh.folder.file(c.file));
+            fresh.folder.remove(c.file);
         } else {
             fresh.folder.put(c.file, c.bytes);
         }
@@ -122,7 +111,7 @@ TEST_F(Form1Test, ASecondCopyNamesTheFolderAndEndsWithStatusThreeTouchingNothing
     putRock();
     start();
     folder.put("pemla.journal", "the first copy's commit, under way");
-    const Files before = snapshot();
+    const Files before = files();
     ui::memory::MemoryPlatform other;
     test_support::MemoryForm1 otherView;
     main_window::Form1 second(otherView.controls(), other, store);
@@ -132,7 +121,7 @@ TEST_F(Form1Test, ASecondCopyNamesTheFolderAndEndsWithStatusThreeTouchingNothing
     EXPECT_NE(other.shown()[0].prompt.find("\"" + folder.path() + "\""), std::string::npos);
     EXPECT_EQ(other.endStatus(), 3);
     EXPECT_EQ(otherView.List_list.count(), 0);
-    EXPECT_EQ(snapshot(), before);
+    EXPECT_EQ(files(), before);
 }
 
 // "Exit" ends at once, unloading nothing; closing unloads the loaded dialogs, export first.

@@ -1,34 +1,25 @@
 #include "tests/support/faulty_sys.h"
 
+#include <fcntl.h>
+#include <signal.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
+#include <cstdio>
+#include <iostream>
 
 namespace test_support {
 
 const char* sysCallName(SysCall kind) {
-    switch (kind) {
-        case SysCall::Open:
-            return "open";
-        case SysCall::Read:
-            return "read";
-        case SysCall::Write:
-            return "write";
-        case SysCall::Fsync:
-            return "fsync";
-        case SysCall::Close:
-            return "close";
-        case SysCall::Rename:
-            return "rename";
-        case SysCall::Unlink:
-            return "unlink";
-    }
-    return "?";
+    static const char* const names[] = {"open",  "read",   "write", "fsync",
+                                        "close", "rename", "unlink"};
+    return names[static_cast<std::size_t>(kind)];
 }
 
 FaultySys::~FaultySys() {
-    for (int fd : openFds_) ::close(fd);
+    for (const auto& item : openFiles_) ::close(item.first);
 }
 
 void FaultySys::failAt(SysCall kind, int n, int errnum, int times) {
@@ -42,18 +33,20 @@ void FaultySys::crashAt(int step) {
     crashAt_ = step;
 }
 
-bool FaultySys::fault(SysCall kind) {
+bool FaultySys::fault(SysCall kind, const Hit& file) {
     if (dead_) throw CrashStop{};
+    if (killStep_ > 0 && steps_ + 1 == killStep_) ::raise(SIGKILL);
     ++steps_;
     const int count = ++counts_[static_cast<std::size_t>(kind)];
     if (crashAt_ > 0 && steps_ == crashAt_) {
         // The kernel closes a killed process's files; nothing else of it runs.
-        for (int fd : openFds_) ::close(fd);
-        openFds_.clear();
+        for (const auto& item : openFiles_) ::close(item.first);
+        openFiles_.clear();
         dead_ = fired_ = true;
         throw CrashStop{};
     }
     if (failAt_ > 0 && kind == failKind_ && count >= failAt_ && count < failAt_ + failTimes_) {
+        if (!fired_) hit_ = file;
         fired_ = true;
         errno = failErrno_;
         return true;
@@ -62,48 +55,77 @@ bool FaultySys::fault(SysCall kind) {
 }
 
 int FaultySys::open(const std::string& path, int flags, mode_t mode) {
-    if (fault(SysCall::Open)) return -1;
+    const Hit file{path, (flags & O_ACCMODE) == O_RDONLY && (flags & O_DIRECTORY) == 0};
+    if (fault(SysCall::Open, file)) return -1;
     const int fd = Sys::open(path, flags, mode);
-    if (fd >= 0) openFds_.insert(fd);
+    if (fd >= 0) openFiles_[fd] = file;
     return fd;
 }
 
 ssize_t FaultySys::read(int fd, void* buffer, size_t size) {
-    if (fault(SysCall::Read)) return -1;
+    if (fault(SysCall::Read, {openFiles_[fd].path, true})) return -1;
     return Sys::read(fd, buffer, size);
 }
 
 ssize_t FaultySys::write(int fd, const void* buffer, size_t size) {
-    if (fault(SysCall::Write)) return -1;
+    if (fault(SysCall::Write, {openFiles_[fd].path, false})) return -1;
     return Sys::write(fd, buffer, writeCap_ > 0 ? std::min(size, writeCap_) : size);
 }
 
 int FaultySys::fsync(int fd) {
-    if (fault(SysCall::Fsync)) return -1;
+    if (fault(SysCall::Fsync, {openFiles_[fd].path, false})) return -1;
     return Sys::fsync(fd);
 }
 
 int FaultySys::close(int fd) {
-    if (fault(SysCall::Close)) {
+    const bool failed = fault(SysCall::Close, openFiles_[fd]);
+    openFiles_.erase(fd);
+    if (failed) {
         // Linux frees the descriptor even when close reports an error.
         const int err = errno;
         ::close(fd);
-        openFds_.erase(fd);
         errno = err;
         return -1;
     }
-    openFds_.erase(fd);
     return Sys::close(fd);
 }
 
 int FaultySys::rename(const std::string& from, const std::string& to) {
-    if (fault(SysCall::Rename)) return -1;
+    if (fault(SysCall::Rename, {to, false})) return -1;
     return Sys::rename(from, to);
 }
 
 int FaultySys::unlink(const std::string& path) {
-    if (fault(SysCall::Unlink)) return -1;
+    if (fault(SysCall::Unlink, {path, false})) return -1;
     return Sys::unlink(path);
+}
+
+int inChild(const std::function<void()>& body, int killAfterMs) {
+    // Output is flushed first so that the child repeats none of it.
+    std::cout.flush();
+    std::fflush(nullptr);
+    const pid_t pid = ::fork();
+    if (pid < 0) return -1;
+    if (pid == 0) {
+        try {
+            body();
+        } catch (...) {
+            ::_exit(100);
+        }
+        ::_exit(0);
+    }
+    if (killAfterMs >= 0) {
+        ::usleep(static_cast<useconds_t>(killAfterMs) * 1000);
+        ::kill(pid, SIGKILL);
+    }
+    int status = 0;
+    while (::waitpid(pid, &status, 0) < 0 && errno == EINTR) {
+    }
+    return status;
+}
+
+bool killed(int status) {
+    return status != -1 && WIFSIGNALED(status) && WTERMSIG(status) == SIGKILL;
 }
 
 }  // namespace test_support

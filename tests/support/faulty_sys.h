@@ -2,7 +2,10 @@
 
 #include <array>
 #include <cstddef>
-#include <set>
+#include <functional>
+#include <map>
+#include <optional>
+#include <string>
 
 #include "catalogue/sys.h"
 
@@ -20,24 +23,36 @@ const char* sysCallName(SysCall kind);
 struct CrashStop {};
 
 // The real system calls with one planned fault: the n-th call of a kind fails with an errno,
-// or the n-th call of any kind throws CrashStop (and every call after it, since a killed
-// process makes no more calls). Counts every call.
+// the n-th call of any kind throws CrashStop (and every call after it, since a killed process
+// makes no more calls), or the process is killed with SIGKILL before a call. Counts every call
+// and remembers the file the fault hit.
 class FaultySys : public catalogue::Sys {
   public:
+    struct Hit {
+        std::string path;
+        bool reading;  // an open for reading, a read, or the close of a file opened for reading
+    };
     ~FaultySys() override;
 
     // The n-th call (counting from 1) of `kind` fails with `errnum` without taking effect, and
     // so do the `times` - 1 calls of that kind after it.
     void failAt(SysCall kind, int n, int errnum, int times = 1);
+    // The same, counting from now on.
+    void failNext(SysCall kind, int n, int errnum, int times = 1) {
+        failAt(kind, calls(kind) + n, errnum, times);
+    }
     // The n-th call of any kind throws CrashStop; the process's open files are closed then.
     void crashAt(int step);
+    // The n-th call of any kind from now on kills the process before it is made.
+    void killAt(int n) { killStep_ = steps_ + n; }
     // Writes move at most `bytes` bytes per call, as a pipe or a full disk may do.
     void capWrites(std::size_t bytes) { writeCap_ = bytes; }
 
     int calls(SysCall kind) const { return counts_[static_cast<std::size_t>(kind)]; }
     int steps() const { return steps_; }
-    // Whether the planned fault or crash has happened.
+    // Whether the planned fault or crash has happened, and on which file.
     bool fired() const { return fired_; }
+    const std::optional<Hit>& hit() const { return hit_; }
 
     int open(const std::string& path, int flags, mode_t mode) override;
     ssize_t read(int fd, void* buffer, size_t size) override;
@@ -49,7 +64,7 @@ class FaultySys : public catalogue::Sys {
 
   private:
     // Counts the call; true when it is the one to fail (errno is then set).
-    bool fault(SysCall kind);
+    bool fault(SysCall kind, const Hit& file);
 
     std::array<int, kAllSysCalls.size()> counts_{};
     int steps_ = 0;
@@ -58,10 +73,18 @@ class FaultySys : public catalogue::Sys {
     int failTimes_ = 1;
     int failErrno_ = 0;
     int crashAt_ = 0;
+    int killStep_ = 0;
     bool fired_ = false;
     bool dead_ = false;
     std::size_t writeCap_ = 0;
-    std::set<int> openFds_;
+    std::optional<Hit> hit_;
+    std::map<int, Hit> openFiles_;
 };
+
+// Runs `body` in a forked child that ends with _exit(0) when it returns and _exit(100) when it
+// throws; returns the wait status. With `killAfterMs`, the child is killed that long after.
+int inChild(const std::function<void()>& body, int killAfterMs = -1);
+// Whether the wait status is that of a process killed with SIGKILL.
+bool killed(int status);
 
 }  // namespace test_support

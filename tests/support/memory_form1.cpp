@@ -20,11 +20,19 @@ main_window::Form1Controls MemoryForm1::controls() {
             Command_add, Command_change, Command_clear};
 }
 
-MainWindowFixture::MainWindowFixture() : store(folder.path()) {
-    folder.put("type.dat", "Types\r\nMusic CD\r\nDVD video\r\nGame\r\n");
-    folder.put("information.dat", "Information\r\nOriginal\r\nCopy\r\n");
-    folder.put("pemla.dat", "");
-    form = std::make_unique<main_window::Form1>(view.controls(), platform, store);
+MainWindowFixture::MainWindowFixture(const std::string& existing)
+    : folder(existing.empty() ? TempFolder() : TempFolder(existing)),
+      out(existing.empty() ? std::make_unique<TempFolder>() : nullptr),
+      store(folder.path(), sys),
+      form(std::make_unique<main_window::Form1>(view.controls(), platform, store)),
+      newList(newListView.controls(), platform, store, *form),
+      exporter(exportView.controls(), platform, store, *form) {
+    if (existing.empty()) {
+        folder.put("type.dat", "Types\r\nMusic CD\r\nDVD video\r\nGame\r\n");
+        folder.put("information.dat", "Information\r\nOriginal\r\nCopy\r\n");
+        folder.put("pemla.dat", "");
+    }
+    form->setDialogs({&newListView.window, &exportView.window, nullptr});
 }
 
 void MainWindowFixture::putList(const std::string& name, const std::string& entries,
@@ -36,12 +44,84 @@ void MainWindowFixture::putList(const std::string& name, const std::string& entr
     if (!flag.empty()) folder.put(name + ".inf", flag);
 }
 
+void MainWindowFixture::putRock(const std::string& index) {
+    putList("Rock", entryText({{"Abba Gold", "Music CD", "1", "Original"}}),
+            articleText({{"Abba Gold", "A001"}}), "A#002\r\n");
+    folder.put("pemla.dat", index);
+}
+
 void MainWindowFixture::start() {
     view.window.show();
 }
 
-void MainWindowFixture::open(const std::string& list) {
-    ASSERT_TRUE(view.List_list.userSelect(list)) << "no list " << list;
+bool MainWindowFixture::open(const std::string& list) {
+    const bool shown = view.List_list.userSelect(list);
+    EXPECT_TRUE(shown) << "no list " << list;
+    return shown;
+}
+
+bool MainWindowFixture::select(const std::string& title) {
+    const bool shown = view.List1.userSelect(title);
+    EXPECT_TRUE(shown) << "no title " << title;
+    return shown;
+}
+
+void MainWindowFixture::fill(const catalogue::Entry& e) {
+    const auto retype = [](auto& box, const std::string& text) {
+        box.type(std::string(box.text().size(), '\b') + text);
+    };
+    retype(view.Text1, e.title);
+    retype(view.Combo1, e.type);
+    retype(view.Combo2, e.discs);
+    retype(view.Combo3, e.information);
+}
+
+void MainWindowFixture::addDylan(const std::string& information) {
+    platform.answer(ui::Answer::Ok);
+    fill({"Dylan", "Game", "1", information});
+    view.Command_add.click();
+}
+
+void MainWindowFixture::deleteList() {
+    for (ui::Answer a : {ui::Answer::Yes, ui::Answer::Yes, ui::Answer::Ok}) platform.answer(a);
+    view.Command_delete.click();
+}
+
+void MainWindowFixture::createList(const std::string& name) {
+    view.Command_create.click();
+    newListView.Text1.type(name);
+    newListView.Command1.click();
+}
+
+Files MainWindowFixture::files() const {
+    Files files = snapshot(folder.path());
+    if (!out) return files;
+    files.merge(snapshot(out->path(), "out/"));
+    for (auto& [name, bytes] : files) {
+        for (std::size_t at; (at = bytes.find(out->path())) != std::string::npos;) {
+            bytes.replace(at, out->path().size(), "<out>");
+        }
+    }
+    return files;
+}
+
+std::vector<ui::memory::MemoryPlatform::Shown> MainWindowFixture::errors() const {
+    std::vector<ui::memory::MemoryPlatform::Shown> shown;
+    for (const auto& box : platform.shown()) {
+        if (box.title == "Error") shown.push_back(box);
+    }
+    return shown;
+}
+
+void MainWindowFixture::expectBox(std::size_t before, int style, const std::string& title,
+                                  const std::string& prompt) const {
+    const auto& shown = platform.shown();
+    ASSERT_EQ(shown.size(), before + 1);
+    EXPECT_EQ(shown.back().style, style);
+    EXPECT_EQ(shown.back().title, title);
+    if (!prompt.empty()) {
+        EXPECT_EQ(shown.back().prompt, prompt);
+    }
 }
 
 }  // namespace test_support

@@ -1,10 +1,16 @@
 #pragma once
 
 #include <memory>
+#include <string>
+#include <vector>
 
 #include "catalogue/store.h"
+#include "export/form_export.h"
 #include "main_window/form1.h"
+#include "new_list/form_new_list.h"
+#include "tests/support/faulty_sys.h"
 #include "tests/support/memory/memory_controls.h"
+#include "tests/support/memory_dialogs.h"
 #include "tests/support/temp_folder.h"
 
 namespace test_support {
@@ -38,24 +44,55 @@ struct MemoryForm1 {
     ui::memory::MemoryButton Command_clear;
 };
 
-// A catalogue folder with the supplied suggestion files and an index, and the main window on it.
-// Call start() after putting the files a test needs.
+// A catalogue folder with the supplied suggestion files and an empty index, an output folder,
+// and the main window with its new-list and export dialogs on it, every system call going
+// through `sys`. Given a folder, the windows work over that one (and no output folder) and
+// leave it in place. Call start() after putting the files a test needs.
 struct MainWindowFixture {
-    MainWindowFixture();
+    explicit MainWindowFixture(const std::string& existing = {});
+
     // Writes a list's files: entry text, article text, counter text, and the flag (none when
     // `flag` is empty).
     void putList(const std::string& name, const std::string& entries, const std::string& articles,
                  const std::string& counter = "A#001\r\n", const std::string& flag = " 1 \r\n");
+    // The list "Rock" holding "Abba Gold" (A001), and the index `index`.
+    void putRock(const std::string& index = "Rock\r\n");
     // Loads the main window (its start-up runs).
     void start();
-    // Opens a list as the user does, by selecting it in the list of lists.
-    void open(const std::string& list);
+    // The user selects a list, or a title of the open list; false (and a failure) when it is
+    // not shown.
+    bool open(const std::string& list);
+    bool select(const std::string& title);
+    // The user clears the entry fields and types these values.
+    void fill(const catalogue::Entry& entry);
+    // The user adds "Dylan" (Game, 1) with this information to the open list, or deletes the
+    // selected list confirming twice; an error box, should one come, is answered.
+    void addDylan(const std::string& information = "x");
+    void deleteList();
+    // The user opens the new-list dialog, types the name and presses "Create".
+    void createList(const std::string& name);
+
+    // The catalogue folder's files, and the output folder's under "out/", whose path in them
+    // reads "<out>".
+    Files files() const;
+    // The message boxes titled "Error" shown so far.
+    std::vector<ui::memory::MemoryPlatform::Shown> errors() const;
+    // Exactly one message box was shown since `before` boxes, with this style, title and prompt
+    // (any prompt when none is given).
+    void expectBox(std::size_t before, int style, const std::string& title,
+                   const std::string& prompt = {}) const;
 
     TempFolder folder;
+    std::unique_ptr<TempFolder> out;
+    FaultySys sys;
     catalogue::Store store;
     ui::memory::MemoryPlatform platform;
     MemoryForm1 view;
     std::unique_ptr<main_window::Form1> form;
+    MemoryNewList newListView;
+    new_list::Form_new_list newList;
+    MemoryFormExport exportView;
+    exporting::Form_Export exporter;
 };
 
 }  // namespace test_support

@@ -9,6 +9,9 @@
 #include <sstream>
 #include <vector>
 
+#include "catalogue/folder_lock.h"
+#include "catalogue/store.h"
+
 namespace test_support {
 
 TempFolder::TempFolder() {
@@ -18,6 +21,7 @@ TempFolder::TempFolder() {
 }
 
 TempFolder::~TempFolder() {
+    if (!owned_) return;
     std::error_code ec;
     std::filesystem::permissions(path_, std::filesystem::perms::owner_all,
                                  std::filesystem::perm_options::add, ec);
@@ -46,6 +50,10 @@ bool TempFolder::has(std::string_view name) const {
     return std::filesystem::exists(std::filesystem::symlink_status(file(name), ec));
 }
 
+void TempFolder::remove(std::string_view name) const {
+    std::filesystem::remove(file(name));
+}
+
 std::string TempFolder::listing() const {
     std::vector<std::string> names;
     for (const auto& item : std::filesystem::directory_iterator(path_)) {
@@ -65,6 +73,64 @@ void putMusicCatalogue(const TempFolder& folder) {
     folder.put("Music.art", "Zebra#*\\Z001\r\n");
     folder.put("Music.arn", "A#001\r\nZ#002\r\n");
     folder.put("Music.inf", " 1 \r\n");
+}
+
+namespace fs = std::filesystem;
+
+Files snapshot(const std::string& folder, const std::string& prefix) {
+    Files files;
+    for (const auto& item : fs::directory_iterator(folder)) {
+        if (item.path().filename() == catalogue::kLockName) continue;
+        std::string& bytes = files[prefix + item.path().filename().string()];
+        const fs::file_status status = item.symlink_status();
+        if (fs::is_symlink(status)) {
+            bytes = "[link to " + fs::read_symlink(item.path()).string() + "]";
+        } else if (fs::is_directory(status)) {
+            bytes = "[folder]";
+        } else if (fs::is_fifo(status)) {
+            bytes = "[fifo]";
+        } else {
+            std::ostringstream in;
+            in << std::ifstream(item.path(), std::ios::binary).rdbuf();
+            bytes = in.str();
+        }
+    }
+    return files;
+}
+
+std::string difference(const Files& a, const Files& b) {
+    std::string out;
+    for (const auto& [name, bytes] : a) {
+        if (!b.contains(name) || b.at(name) != bytes) out += " " + name;
+    }
+    for (const auto& item : b) out += a.contains(item.first) ? "" : " +" + item.first;
+    return out;
+}
+
+bool hasLeftovers(const Files& files) {
+    return std::any_of(files.begin(), files.end(), [](const auto& item) {
+        return item.first.ends_with(catalogue::kTempSuffix) ||
+               item.first == catalogue::kJournalName;
+    });
+}
+
+std::string crlf(const std::vector<std::string>& lines) {
+    std::string text;
+    for (const std::string& line : lines) text += line + "\r\n";
+    return text;
+}
+
+std::string entryText(const std::vector<catalogue::Entry>& entries) {
+    std::string text;
+    for (const catalogue::Entry& e : entries)
+        text += crlf({"<|?" + e.title, "<|'" + e.type, "<||" + e.discs, "<|*" + e.information});
+    return text;
+}
+
+std::string articleText(const std::vector<std::pair<std::string, std::string>>& lines) {
+    std::string text;
+    for (const auto& [title, number] : lines) text += title + "#*\\" + number + "\r\n";
+    return text;
 }
 
 }  // namespace test_support

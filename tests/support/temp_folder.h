@@ -1,14 +1,22 @@
 #pragma once
 
+#include <map>
+#include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
+#include <vector>
+
+#include "catalogue/records.h"
 
 namespace test_support {
 
-// A fresh empty folder for one test, removed with everything in it afterwards.
+// A fresh empty folder for one test, removed with everything in it afterwards; or, given a
+// path, that existing folder, left in place.
 class TempFolder {
   public:
     TempFolder();
+    explicit TempFolder(std::string existing) : path_(std::move(existing)), owned_(false) {}
     ~TempFolder();
     TempFolder(const TempFolder&) = delete;
     TempFolder& operator=(const TempFolder&) = delete;
@@ -20,15 +28,33 @@ class TempFolder {
     // The bytes of a file of the folder; fails the test when it cannot be read.
     std::string get(std::string_view name) const;
     bool has(std::string_view name) const;
+    void remove(std::string_view name) const;
     // Every file name in the folder, sorted.
     std::string listing() const;
 
   private:
     std::string path_;
+    bool owned_ = true;
 };
 
 // A small catalogue for the tests of the real windows: the suggestion files and the list "Music"
 // holding "Zebra" (Music CD, 1 disc, Original, Z001).
 void putMusicCatalogue(const TempFolder& folder);
+
+// Every file of a folder by name: its bytes, or "[folder]", "[fifo]", "[link to X]". The running
+// program's lock file is left out; temporary files and the journal are in.
+using Files = std::map<std::string, std::string>;
+Files snapshot(const std::string& folder, const std::string& prefix = {});
+// The names that differ between two snapshots (" +name": only in the second), for a message.
+std::string difference(const Files& a, const Files& b);
+// Whether a temporary file or a journal is among the files.
+bool hasLeftovers(const Files& files);
+
+// Lines, each followed by CR LF: what every file the program writes looks like.
+std::string crlf(const std::vector<std::string>& lines);
+// Entries as the entry file holds them, four tagged lines each.
+std::string entryText(const std::vector<catalogue::Entry>& entries);
+// Article lines from title and number.
+std::string articleText(const std::vector<std::pair<std::string, std::string>>& lines);
 
 }  // namespace test_support

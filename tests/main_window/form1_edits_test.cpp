@@ -1,0 +1,174 @@
+// "Add", "Change", "Delete entry" and "Delete list" as the window shows them: the questions it
+// asks, its answers to a refusal, and the lists and fields afterwards. What each leaves in the
+// files is the catalogue suite's.
+#include "bench/catalogue_maker.h"
+#include "catalogue/entry_rules.h"
+#include "tests/main_window/form1_test_fixture.h"
+
+namespace main_window_test {
+namespace {
+
+constexpr const char* kDeleteList = "ARE YA SURE YA WANT TO DELETE THE SELECTED LIST?";
+
+TEST_F(Form1Test, AddShowsTheNewTitleAndEmptiesTheFieldsOrKeepsThemWithTheRefusal) {
+    startWithRock();
+    fill({"Blues", "Music CD", "2", "Copy"});
+    view.Command_add.click();
+    EXPECT_EQ(titles(), (Strings{"1st", "abc", "abcd", "Blues", "xabc", "Zebra"}));
+    EXPECT_EQ(view.Label2.caption(), "... amount:  6 ...");
+    expectReset();
+    EXPECT_TRUE(view.Text1.hasFocus());
+    EXPECT_EQ(folder.get("Rock.dat"),
+              entryText(rock) + entryText({{"Blues", "Music CD", "2", "Copy"}}));
+    EXPECT_TRUE(platform.shown().empty());
+
+    const Files before = files();
+    for (const catalogue::Entry& refused :
+         {catalogue::Entry{"ABC", "CD", "1", "Copy"}, catalogue::Entry{"a<|?b", "CD", "1", ""}}) {
+        fill(refused);
+        platform.answer(Answer::Ok);
+        view.Command_add.click();
+        EXPECT_EQ(platform.shown().back().prompt, catalogue::entryRefusal(refused).empty()
+                                                      ? catalogue::kDuplicateTitle
+                                                      : catalogue::entryRefusal(refused));
+        EXPECT_EQ(fields(), refused.title + "|" + refused.type + "|" + refused.discs + "|" +
+                                refused.information + "|");
+        EXPECT_TRUE(view.Text1.hasFocus());
+    }
+    expectBox(1, 16, "Error");
+    EXPECT_EQ(files(), before);
+}
+
+// With no list open, "Add" says so, keeps what was typed and writes nothing.
+TEST_F(Form1Test, AddWithNoListOpenSaysSo) {
+    putRock();
+    start();
+    const Files before = files();
+    fill({"Orphan", "CD", "1", ""});
+    platform.answer(Answer::Ok);
+    view.Command_add.click();
+    expectBox(0, 16, "Error",
+              "No list is open, so the title was not added. Select the list to add it to, then "
+              "press Add again.");
+    EXPECT_EQ(fields(), "Orphan|CD|1||");
+    EXPECT_EQ(files(), before);
+}
+
+// A list at its largest (32767 entries of about 100 bytes): the window counts the titles it
+// shows, and refuses another.
+TEST_F(Form1Test, AFullListRefusesAnAdd) {
+    bench::writeList(folder.path(), "Big", catalogue::kMaxEntries);
+    folder.put("pemla.dat", "Big\r\n");
+    start();
+    open("Big");
+    EXPECT_EQ(view.Label2.caption(), "... amount:  32767 ...");
+    const Files before = files();
+    fill({"One too many", "CD", "1", ""});
+    platform.answer(Answer::Ok);
+    view.Command_add.click();
+    expectBox(0, 16, "Error", catalogue::kListFull);
+    EXPECT_EQ(files(), before);
+}
+
+TEST_F(Form1Test, ChangeAsksFirstAndShowsTheChangedTitle) {
+    startWithRock();
+    const Files before = files();
+    platform.answer(Answer::Ok);
+    view.Command_change.click();
+    expectBox(0, 16, "Error", "Select the entry to change in the list first.");
+
+    // A value the files cannot hold is refused before the question.
+    select("abc");
+    retype(view.Combo1, "a<|*");
+    platform.answer(Answer::Ok);
+    view.Command_change.click();
+    expectBox(1, 16, "Error");
+
+    select("abc");
+    retype(view.Combo1, "LP");
+    platform.answer(Answer::No);
+    view.Command_change.click();
+    expectBox(2, 4, "Change item", "Are ya sure yo want to change selected entry?");
+    expectReset();
+    EXPECT_EQ(files(), before);
+
+    select("abc");
+    retype(view.Text1, "Quartz");
+    platform.answer(Answer::Yes);
+    view.Command_change.click();
+    EXPECT_EQ(titles(), (Strings{"1st", "abcd", "Quartz", "xabc", "Zebra"}));
+    expectReset();
+    EXPECT_EQ(platform.shown().size(), 4u);
+    select("Quartz");
+    EXPECT_EQ(fields(), "Quartz|Game|3||Q001");
+}
+
+TEST_F(Form1Test, DeleteEntryAsksFirstAndKeepsTheDeletedValuesInTheFields) {
+    startWithRock();
+    const Files before = files();
+    view.Command_delentry.click();  // nothing selected: nothing asked
+    EXPECT_TRUE(platform.shown().empty());
+    select("abc");
+    platform.answer(Answer::No);
+    view.Command_delentry.click();
+    expectBox(0, 260, "Change item", "Are ya sure yo want to DELETE selected entry?");
+    EXPECT_EQ(fields(), "abc|Game|3||A002");
+    EXPECT_EQ(files(), before);
+
+    select("xabc");
+    platform.answer(Answer::Yes);
+    view.Command_delentry.click();
+    EXPECT_EQ(titles(), (Strings{"1st", "abc", "abcd", "Zebra"}));
+    EXPECT_EQ(view.Label2.caption(), "... amount:  4 ...");
+    EXPECT_EQ(fields(), "xabc|CD|10|x|X001");
+    EXPECT_EQ(view.List1.selectedIndex(), -1);
+}
+
+TEST_F(Form1Test, DeletingTheOnlyEntryShowsThePlaceholder) {
+    putList("Solo", entryText({{"Jazz Album", "CD", "2", "Copy"}}),
+            articleText({{"Jazz Album", "J001"}}), crlf({"J#002"}), " 0 \r\n");
+    folder.put("pemla.dat", "Solo\r\n");
+    start();
+    open("Solo");
+    select("Jazz Album");
+    platform.answer(Answer::Yes);
+    view.Command_delentry.click();
+    expectReset();
+    EXPECT_EQ(view.Label2.caption(), "... amount:  1 ...");
+    select("Add an item and delete me!");
+    EXPECT_EQ(fields(), "Add an item and delete me!|DELETE ME!|DELETE ME!|DELETE ME!|A001");
+}
+
+TEST_F(Form1Test, DeleteListAsksTwiceAndShowsTheListsLeft) {
+    putRock({"Jazz"});
+    start();
+    const Files before = files();
+    view.Command_delete.click();  // nothing selected: nothing asked
+    open("Rock");
+    platform.answer(Answer::No);
+    view.Command_delete.click();
+    expectBox(0, 260, "DELETE?", kDeleteList);
+    platform.answer(Answer::Yes);
+    platform.answer(Answer::No);
+    view.Command_delete.click();
+    EXPECT_EQ(platform.shown()[1].prompt, kDeleteList);
+    expectBox(2, 308, "DELETE?", "ARE YA REALLY SURE?");
+    EXPECT_EQ(files(), before);
+
+    for (const std::string list : {"Rock", "Jazz"}) {
+        open(list);
+        platform.answer(Answer::Yes);
+        platform.answer(Answer::Yes);
+        view.Command_delete.click();
+    }
+    const std::string placeholder(catalogue::kPlaceholderList);
+    EXPECT_EQ(view.List_list.items(), (Strings{placeholder}));
+    EXPECT_EQ(view.List_list.selectedIndex(), -1);
+    EXPECT_TRUE(titles().empty());
+    open(placeholder);
+    EXPECT_EQ(titles(), (Strings{"Add an item and delete me!"}));
+    EXPECT_EQ(platform.shown().size(), 7u);
+}
+
+}  // namespace
+}  // namespace main_window_test
