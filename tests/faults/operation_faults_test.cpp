@@ -5,7 +5,6 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
-#include <iostream>
 
 #include "catalogue/file_text.h"
 #include "catalogue/list_import.h"
@@ -14,7 +13,6 @@
 namespace faults {
 namespace {
 
-using test_support::SysCall;
 using ui::Answer;
 
 struct Operation {
@@ -102,7 +100,7 @@ void setUp(Rig& r, const Operation& op) {
               crlf({"M#002"}));
     r.folder.put("pemla.dat", op.onlyList ? crlf({"Solo"}) : crlf({"Rock", "Jazz", "Solo"}));
     const char* html = op.exportDialog == 1 ? "1" : "0";
-    r.folder.put("export.dat", crlf({r.out->path(), "0", html, "0", "0", "0", "0", "10", "Top"}));
+    r.folder.put("export.dat", crlf({r.out.path(), "0", html, "0", "0", "0", "0", "10", "Top"}));
     if (op.earlierBuild) {
         r.putList("B\xFChne", kAbbaDat, crlf({"Abba Gold#*\\A001"}), crlf({"A#002"}));
         r.folder.put("pemla.dat", crlf({"Rock", "B\xFChne"}));
@@ -157,9 +155,8 @@ class OperationFaults : public ::testing::TestWithParam<Operation> {};
 TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
     const Operation& op = GetParam();
     const auto [before, after] = reference(op);
-    int points = 0, kept = 0, readAfter = 0;
     for (SysCall kind : test_support::kAllSysCalls) {
-        for (int n = 1;; ++n, ++points) {
+        for (int n = 1;; ++n) {
             SCOPED_TRACE(std::string(test_support::sysCallName(kind)) + " #" + std::to_string(n));
             Rig r;
             setUp(r, op);
@@ -178,13 +175,12 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
             EXPECT_EQ(left, now) << difference(left, now);
             const auto errors = r.errors();
             if (now == before) {
-                ++kept;
                 ASSERT_EQ(errors.size(), 1u) << "a failure nobody was told of";
                 EXPECT_EQ(errors.front().style, 16);
                 const std::string file = namedFile(errors.front().prompt);
                 EXPECT_TRUE(file.empty() || before.contains(file) || after.contains(file) ||
                             after.contains("out/" + file) || file == catalogue::kJournalName ||
-                            file == r.folder.path() || file == r.out->path())
+                            file == r.folder.path() || file == r.out.path())
                     << errors.front().prompt;
                 runAction(r, op, false);
                 Files retried = r.files();
@@ -193,7 +189,6 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
                 EXPECT_EQ(r.errors().size(), 1u);
             } else if (now == after && !errors.empty()) {
                 // Done; only a failed read while showing the result may still be reported.
-                ++readAfter;
                 const std::string& path = r.sys.hit()->path;
                 EXPECT_TRUE(r.sys.hit()->reading) << errors.front().prompt;
                 EXPECT_TRUE(path.ends_with("/" + namedFile(errors.front().prompt))) << path;
@@ -202,17 +197,12 @@ TEST_P(OperationFaults, AFailingCallLeavesTheOldFilesAndSaysSoOrTheNewFiles) {
             }
         }
     }
-    std::cout << "[ faults ] " << op.name << ": " << points << " fault points, " << kept
-              << " kept the old files and said so, " << points - kept << " finished the change ("
-              << readAfter << " then told of a failed read while showing it)\n";
-    EXPECT_GT(points, 0);
 }
 
 TEST_P(OperationFaults, AKillAtAnyStepRecoversToTheOldOrTheNewFiles) {
     const Operation& op = GetParam();
     const auto [before, after] = reference(op);
-    int points = 0, finished = 0;
-    for (int step = 1;; ++step, ++points) {
+    for (int step = 1;; ++step) {
         SCOPED_TRACE("killed at step " + std::to_string(step));
         Rig r;
         setUp(r, op);
@@ -230,12 +220,8 @@ TEST_P(OperationFaults, AKillAtAnyStepRecoversToTheOldOrTheNewFiles) {
             break;
         }
         EXPECT_FALSE(dropStrays(now)) << "a name probe or report copy left after the start";
-        finished += now == after ? 1 : 0;
         EXPECT_TRUE(now == after || now == before) << difference(before, now);
     }
-    std::cout << "[ faults ] " << op.name << ": " << points << " kill points, " << finished
-              << " recovered to the new files, " << points - finished << " to the old\n";
-    EXPECT_GT(points, 0);
 }
 
 // Another program rewrites the open list's entry file (or, for a list deletion, the index) after

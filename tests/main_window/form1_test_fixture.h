@@ -66,11 +66,6 @@ class Form1Test : public ::testing::Test, public test_support::MainWindowFixture
         open("Rock");
     }
 
-    // The user clears a box and types into it.
-    template <typename Box>
-    static void retype(Box& box, const std::string& text) {
-        box.type(std::string(box.text().size(), '\b') + text);
-    }
     Strings titles() const { return view.List1.items(); }
     std::string fields() const {
         return view.Text1.text() + "|" + view.Combo1.text() + "|" + view.Combo2.text() + "|" +

@@ -29,22 +29,10 @@ void FaultySys::failAt(SysCall kind, int n, int errnum, int times) {
     failErrno_ = errnum;
 }
 
-void FaultySys::crashAt(int step) {
-    crashAt_ = step;
-}
-
 bool FaultySys::fault(SysCall kind, const Hit& file) {
-    if (dead_) throw CrashStop{};
     if (killStep_ > 0 && steps_ + 1 == killStep_) ::raise(SIGKILL);
     ++steps_;
     const int count = ++counts_[static_cast<std::size_t>(kind)];
-    if (crashAt_ > 0 && steps_ == crashAt_) {
-        // The kernel closes a killed process's files; nothing else of it runs.
-        for (const auto& item : openFiles_) ::close(item.first);
-        openFiles_.clear();
-        dead_ = fired_ = true;
-        throw CrashStop{};
-    }
     if (failAt_ > 0 && kind == failKind_ && count >= failAt_ && count < failAt_ + failTimes_) {
         if (!fired_) hit_ = file;
         fired_ = true;
@@ -100,7 +88,7 @@ int FaultySys::unlink(const std::string& path) {
     return Sys::unlink(path);
 }
 
-int inChild(const std::function<void()>& body, int killAfterMs) {
+int inChild(const std::function<void()>& body) {
     // Output is flushed first so that the child repeats none of it.
     std::cout.flush();
     std::fflush(nullptr);
@@ -113,10 +101,6 @@ int inChild(const std::function<void()>& body, int killAfterMs) {
             ::_exit(100);
         }
         ::_exit(0);
-    }
-    if (killAfterMs >= 0) {
-        ::usleep(static_cast<useconds_t>(killAfterMs) * 1000);
-        ::kill(pid, SIGKILL);
     }
     int status = 0;
     while (::waitpid(pid, &status, 0) < 0 && errno == EINTR) {

@@ -18,14 +18,9 @@ inline constexpr std::array kAllSysCalls = {SysCall::Open,  SysCall::Read,  SysC
                                             SysCall::Unlink};
 const char* sysCallName(SysCall kind);
 
-// Thrown by FaultySys to stop an operation dead, as if the process had been killed there.
-// Deliberately not a CatalogueError, so no handler in the store can take it for a failure.
-struct CrashStop {};
-
-// The real system calls with one planned fault: the n-th call of a kind fails with an errno,
-// the n-th call of any kind throws CrashStop (and every call after it, since a killed process
-// makes no more calls), or the process is killed with SIGKILL before a call. Counts every call
-// and remembers the file the fault hit.
+// The real system calls with one planned fault: the n-th call of a kind fails with an errno, or
+// the process is killed with SIGKILL before the n-th call of any kind. Counts every call and
+// remembers the file the fault hit.
 class FaultySys : public catalogue::Sys {
   public:
     struct Hit {
@@ -41,16 +36,13 @@ class FaultySys : public catalogue::Sys {
     void failNext(SysCall kind, int n, int errnum, int times = 1) {
         failAt(kind, calls(kind) + n, errnum, times);
     }
-    // The n-th call of any kind throws CrashStop; the process's open files are closed then.
-    void crashAt(int step);
     // The n-th call of any kind from now on kills the process before it is made.
     void killAt(int n) { killStep_ = steps_ + n; }
     // Writes move at most `bytes` bytes per call, as a pipe or a full disk may do.
     void capWrites(std::size_t bytes) { writeCap_ = bytes; }
 
     int calls(SysCall kind) const { return counts_[static_cast<std::size_t>(kind)]; }
-    int steps() const { return steps_; }
-    // Whether the planned fault or crash has happened, and on which file.
+    // Whether the planned fault has happened, and on which file.
     bool fired() const { return fired_; }
     const std::optional<Hit>& hit() const { return hit_; }
 
@@ -72,18 +64,16 @@ class FaultySys : public catalogue::Sys {
     int failAt_ = 0;
     int failTimes_ = 1;
     int failErrno_ = 0;
-    int crashAt_ = 0;
     int killStep_ = 0;
     bool fired_ = false;
-    bool dead_ = false;
     std::size_t writeCap_ = 0;
     std::optional<Hit> hit_;
     std::map<int, Hit> openFiles_;
 };
 
 // Runs `body` in a forked child that ends with _exit(0) when it returns and _exit(100) when it
-// throws; returns the wait status. With `killAfterMs`, the child is killed that long after.
-int inChild(const std::function<void()>& body, int killAfterMs = -1);
+// throws; returns the wait status.
+int inChild(const std::function<void()>& body);
 // Whether the wait status is that of a process killed with SIGKILL.
 bool killed(int status);
 

@@ -20,18 +20,14 @@ main_window::Form1Controls MemoryForm1::controls() {
             Command_add, Command_change, Command_clear};
 }
 
-MainWindowFixture::MainWindowFixture(const std::string& existing)
-    : folder(existing.empty() ? TempFolder() : TempFolder(existing)),
-      out(existing.empty() ? std::make_unique<TempFolder>() : nullptr),
-      store(folder.path(), sys),
+MainWindowFixture::MainWindowFixture()
+    : store(folder.path(), sys),
       form(std::make_unique<main_window::Form1>(view.controls(), platform, store)),
       newList(newListView.controls(), platform, store, *form),
       exporter(exportView.controls(), platform, store, *form) {
-    if (existing.empty()) {
-        folder.put("type.dat", "Types\r\nMusic CD\r\nDVD video\r\nGame\r\n");
-        folder.put("information.dat", "Information\r\nOriginal\r\nCopy\r\n");
-        folder.put("pemla.dat", "");
-    }
+    folder.put("type.dat", "Types\r\nMusic CD\r\nDVD video\r\nGame\r\n");
+    folder.put("information.dat", "Information\r\nOriginal\r\nCopy\r\n");
+    folder.put("pemla.dat", "");
     form->setDialogs({&newListView.window, &exportView.window, nullptr});
 }
 
@@ -67,9 +63,6 @@ bool MainWindowFixture::select(const std::string& title) {
 }
 
 void MainWindowFixture::fill(const catalogue::Entry& e) {
-    const auto retype = [](auto& box, const std::string& text) {
-        box.type(std::string(box.text().size(), '\b') + text);
-    };
     retype(view.Text1, e.title);
     retype(view.Combo1, e.type);
     retype(view.Combo2, e.discs);
@@ -95,11 +88,10 @@ void MainWindowFixture::createList(const std::string& name) {
 
 Files MainWindowFixture::files() const {
     Files files = snapshot(folder.path());
-    if (!out) return files;
-    files.merge(snapshot(out->path(), "out/"));
+    files.merge(snapshot(out.path(), "out/"));
     for (auto& [name, bytes] : files) {
-        for (std::size_t at; (at = bytes.find(out->path())) != std::string::npos;) {
-            bytes.replace(at, out->path().size(), "<out>");
+        for (std::size_t at; (at = bytes.find(out.path())) != std::string::npos;) {
+            bytes.replace(at, out.path().size(), "<out>");
         }
     }
     return files;

@@ -46,10 +46,9 @@ struct MemoryForm1 {
 
 // A catalogue folder with the supplied suggestion files and an empty index, an output folder,
 // and the main window with its new-list and export dialogs on it, every system call going
-// through `sys`. Given a folder, the windows work over that one (and no output folder) and
-// leave it in place. Call start() after putting the files a test needs.
+// through `sys`. Call start() after putting the files a test needs.
 struct MainWindowFixture {
-    explicit MainWindowFixture(const std::string& existing = {});
+    MainWindowFixture();
 
     // Writes a list's files: entry text, article text, counter text, and the flag (none when
     // `flag` is empty).
@@ -63,8 +62,12 @@ struct MainWindowFixture {
     // not shown.
     bool open(const std::string& list);
     bool select(const std::string& title);
-    // The user clears the entry fields and types these values.
+    // The user clears the entry fields and types these values; or clears one box and types.
     void fill(const catalogue::Entry& entry);
+    template <typename Box>
+    static void retype(Box& box, const std::string& text) {
+        box.type(std::string(box.text().size(), '\b') + text);
+    }
     // The user adds "Dylan" (Game, 1) with this information to the open list, or deletes the
     // selected list confirming twice; an error box, should one come, is answered.
     void addDylan(const std::string& information = "x");
@@ -83,7 +86,7 @@ struct MainWindowFixture {
                    const std::string& prompt = {}) const;
 
     TempFolder folder;
-    std::unique_ptr<TempFolder> out;
+    TempFolder out;
     FaultySys sys;
     catalogue::Store store;
     ui::memory::MemoryPlatform platform;

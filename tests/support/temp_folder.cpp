@@ -21,7 +21,6 @@ TempFolder::TempFolder() {
 }
 
 TempFolder::~TempFolder() {
-    if (!owned_) return;
     std::error_code ec;
     std::filesystem::permissions(path_, std::filesystem::perms::owner_all,
                                  std::filesystem::perm_options::add, ec);

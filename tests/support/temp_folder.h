@@ -11,12 +11,10 @@
 
 namespace test_support {
 
-// A fresh empty folder for one test, removed with everything in it afterwards; or, given a
-// path, that existing folder, left in place.
+// A fresh empty folder for one test, removed with everything in it afterwards.
 class TempFolder {
   public:
     TempFolder();
-    explicit TempFolder(std::string existing) : path_(std::move(existing)), owned_(false) {}
     ~TempFolder();
     TempFolder(const TempFolder&) = delete;
     TempFolder& operator=(const TempFolder&) = delete;
@@ -34,7 +32,6 @@ class TempFolder {
 
   private:
     std::string path_;
-    bool owned_ = true;
 };
 
 // A small catalogue for the tests of the real windows: the suggestion files and the list "Music"
