@@ -3,29 +3,22 @@
 // compared byte for byte with files written out by hand.
 #include <gtest/gtest.h>
 
-#include <QCheckBox>
-#include <QComboBox>
-#include <QFileSystemModel>
-#include <QLineEdit>
 #include <QListWidget>
-#include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
-#include <QTreeView>
 #include <cstdlib>
-#include <deque>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <map>
 
 #include "app/program.h"
+#include "tests/e2e/qt_user.h"
 #include "tests/support/temp_folder.h"
-#include "ui/qt/qt_controls.h"
-#include "ui/qt/qt_platform.h"
 
 namespace {
 
+using namespace qt_user;
 namespace fs = std::filesystem;
 
 const std::string kData = PEMLA_E2E_DATA;
@@ -53,95 +46,7 @@ void expectFolder(const fs::path& folder, const std::string& expectedFolder,
     if (auto settings = expected.find("export.dat"); settings != expected.end()) {
         settings->second.replace(settings->second.find("@OUTPUT@"), 8, output);
     }
-    const std::map<std::string, std::string> actual = filesOf(folder);
-    for (const auto& [name, bytes] : expected) {
-        EXPECT_EQ(actual.contains(name) ? actual.at(name) : "(missing)", bytes)
-            << expectedFolder << "/" << name;
-    }
-    for (const auto& [name, bytes] : actual) {
-        EXPECT_TRUE(expected.contains(name)) << "unexpected " << name << " in " << folder;
-    }
-}
-
-// The message boxes the test expects, in order, each with the answer the user gives. A box
-// that was not expected fails the test and is answered No (or OK).
-class ScriptedBoxes {
-  public:
-    ScriptedBoxes() {
-        ui::qt::QtPlatform::setAnswerHook([this](QMessageBox& box) {
-            const std::string shown = ui::qt::fromQt(box.windowTitle() + ": " + box.text());
-            EXPECT_TRUE(box.isEnabled()) << shown;
-            if (script_.empty()) {
-                ADD_FAILURE() << "unexpected box " << shown;
-                return box.button(QMessageBox::Yes) ? ui::Answer::No : ui::Answer::Ok;
-            }
-            const auto [text, answer] = script_.front();
-            script_.pop_front();
-            EXPECT_EQ(shown, text);
-            return answer;
-        });
-    }
-    ~ScriptedBoxes() { ui::qt::QtPlatform::setAnswerHook(nullptr); }
-
-    // Expects a box "title: text", answered with `answer`.
-    void expect(const std::string& shown, ui::Answer answer = ui::Answer::Yes) {
-        script_.emplace_back(shown, answer);
-    }
-    // Every expected box has been shown.
-    void expectAllShown() {
-        EXPECT_TRUE(script_.empty()) << "not shown: " << script_.front().first;
-        script_.clear();
-    }
-
-  private:
-    std::deque<std::pair<std::string, ui::Answer>> script_;
-};
-
-// A user's hands on the program's widgets.
-void click(QAbstractButton* button) {
-    ASSERT_TRUE(button->isVisible() && button->isEnabled()) << button->text().toStdString();
-    QTest::mouseClick(button, Qt::LeftButton);
-}
-
-void pick(QListWidget* list, const QString& text) {
-    const auto found = list->findItems(text, Qt::MatchExactly);
-    ASSERT_EQ(found.size(), 1) << text.toStdString();
-    list->scrollToItem(found.front());
-    QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
-                      list->visualItemRect(found.front()).center());
-    ASSERT_TRUE(found.front()->isSelected()) << text.toStdString();
-}
-
-// Empties a text field (a combo box's own line) with End and Backspace, then types `latin1`
-// key by key. QTest's own typing knows only ASCII keys, so every letter is sent as its key
-// carrying its text, as a keyboard sends them.
-void retype(QWidget* field, const char* latin1) {
-    auto* line = qobject_cast<QLineEdit*>(field);
-    if (line == nullptr) line = static_cast<QComboBox*>(field)->lineEdit();
-    line->setFocus();
-    QTest::keyClick(line, Qt::Key_End);
-    for (qsizetype n = line->text().size(); n > 0; --n) QTest::keyClick(line, Qt::Key_Backspace);
-    for (QChar c : QString::fromLatin1(latin1)) {
-        const auto key = static_cast<Qt::Key>(c.toUpper().unicode());
-        QTest::sendKeyEvent(QTest::Press, line, key, QString(c), Qt::NoModifier);
-        QTest::sendKeyEvent(QTest::Release, line, key, QString(c), Qt::NoModifier);
-    }
-}
-
-// Clicks a folder shown in a folder list, once the list has read it from disk.
-void pickFolder(QTreeView* tree, const std::string& path) {
-    auto* model = static_cast<QFileSystemModel*>(tree->model());
-    QModelIndex index;
-    const bool shown = QTest::qWaitFor(
-        [&] {
-            index = model->index(QString::fromStdString(path));
-            if (!index.isValid()) return false;
-            tree->scrollTo(index);
-            return !tree->visualRect(index).isEmpty();
-        },
-        10000);
-    ASSERT_TRUE(shown) << path << " never shown in the folder list";
-    QTest::mouseClick(tree->viewport(), Qt::LeftButton, {}, tree->visualRect(index).center());
+    EXPECT_EQ(filesOf(folder), expected) << expectedFolder;
 }
 
 TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
@@ -152,7 +57,7 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     fs::create_directory(reports);
     fs::copy(kData + "/start", work.path());
 
-    ScriptedBoxes boxes;
+    Boxes boxes;
     ui::qt::QtPlatform platform;
     app::Program program(work.path(), platform);
     app::MainWindowView& main = program.mainWindow();
@@ -189,16 +94,14 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     retype(main.Text1, "Zazie dans le m\xe9tro");
     retype(main.Combo1, "DVD video");
     retype(main.Combo3, "Signed");
-    boxes.expect("Change item: Are ya sure yo want to change selected entry?");
     click(main.Command_change);
-    boxes.expectAllShown();
+    EXPECT_EQ(boxes.take(), Shown{"Change item: Are ya sure yo want to change selected entry?"});
     pick(main.List1, QString::fromLatin1("Zazie dans le m\xe9tro"));
     EXPECT_EQ(main.Textart->text(), QStringLiteral("Z001"));
 
     pick(main.List1, QStringLiteral("Casablanca"));
-    boxes.expect("Change item: Are ya sure yo want to DELETE selected entry?");
     click(main.Command_delentry);
-    boxes.expectAllShown();
+    EXPECT_EQ(boxes.take(), Shown{"Change item: Are ya sure yo want to DELETE selected entry?"});
     EXPECT_EQ(main.List1->count(), 3);
 
     // The search finds the changed title by its number, typed in small letters.
@@ -225,17 +128,15 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     exporter.Combo1->setFocus();
     QTest::keyClick(exporter.Combo1, Qt::Key_Down);
     EXPECT_EQ(exporter.Combo1->currentText(), QStringLiteral("Bottom"));
-    boxes.expect("Done: Export done!", ui::Answer::Ok);
     click(exporter.Command1);
-    boxes.expectAllShown();
+    EXPECT_EQ(boxes.take(), Shown{"Done: Export done!"});
 
     // Then as an HTML page without article numbers, the last two added on top.
     click(exporter.Checkart);
     click(exporter.Checkhtml);
     QTest::keyClick(exporter.Combo1, Qt::Key_Up);
-    boxes.expect("Done: Export done!", ui::Answer::Ok);
     click(exporter.Command1);
-    boxes.expectAllShown();
+    EXPECT_EQ(boxes.take(), Shown{"Done: Export done!"});
     click(exporter.Command2);
     ASSERT_TRUE(main.widget()->isEnabled());
 
@@ -244,15 +145,15 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
 
     // The list goes, after two confirmations; the other list stays as it was.
     pick(main.List_list, QStringLiteral("Films"));
-    boxes.expect("DELETE?: ARE YA SURE YA WANT TO DELETE THE SELECTED LIST?");
-    boxes.expect("DELETE?: ARE YA REALLY SURE?");
     click(main.Command_delete);
-    boxes.expectAllShown();
+    EXPECT_EQ(boxes.take(), (Shown{"DELETE?: ARE YA SURE YA WANT TO DELETE THE SELECTED LIST?",
+                                   "DELETE?: ARE YA REALLY SURE?"}));
     ASSERT_EQ(main.List_list->count(), 1);
     EXPECT_EQ(main.List1->count(), 0);
 
     expectFolder(work.path(), "end", reports.string());
     expectFolder(reports, "out");
+    EXPECT_EQ(boxes.take(), Shown{});
 }
 
 }  // namespace

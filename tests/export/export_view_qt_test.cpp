@@ -6,25 +6,20 @@
 #include <QFileSystemModel>
 #include <QLineEdit>
 #include <QListWidget>
-#include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
 #include <QTreeView>
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 
 #include "app/program.h"
+#include "tests/e2e/qt_user.h"
+#include "tests/export/export_fixture.h"
 #include "tests/support/temp_folder.h"
-#include "ui/qt/qt_platform.h"
 
 namespace {
 
-std::string data(const std::string& name) {
-    std::ifstream in(std::string(PEMLA_EXPORT_DATA) + "/" + name, std::ios::binary);
-    return {std::istreambuf_iterator<char>(in), {}};
-}
+using export_test::data;
 
 TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     test_support::TempFolder folder;
@@ -47,14 +42,8 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     app::MainWindowView& mainView = program.mainWindow();
     app::ExportView& view = program.exportDialog();
 
-    // Every box must take the user's answer: none may sit on a disabled window.
-    std::vector<std::string> boxes;
-    ui::qt::QtPlatform::setAnswerHook([&boxes](QMessageBox& box) {
-        boxes.push_back(box.windowTitle().toStdString() + ": " + box.text().toStdString());
-        EXPECT_TRUE(box.isEnabled()) << boxes.back();
-        return ui::Answer::Ok;
-    });
-
+    qt_user::Boxes
+        boxes;  // every box must take the user's answer: none may sit on a disabled window
     program.start();
     mainView.List_list->setCurrentRow(0);  // the user picks the list
     ASSERT_EQ(mainView.List1->count(), 10);
@@ -76,7 +65,7 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     QTest::mouseClick(view.Checkhtml, Qt::LeftButton);
     QTest::mouseClick(view.Command1, Qt::LeftButton);
     EXPECT_TRUE(out.get("Canci\xC3\xB3nes.html").starts_with("<html>\r\n<head>\r\n<title>Canci"));
-    EXPECT_EQ(boxes, std::vector<std::string>(2, "Done: Export done!"));
+    EXPECT_EQ(boxes.take(), std::vector<std::string>(2, "Done: Export done!"));
     EXPECT_TRUE(dialog->isEnabled());
 
     // Too many last added titles: the refusal clears the box, and the export goes on without it.
@@ -86,9 +75,10 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
     view.Text2->clear();
     QTest::keyClicks(view.Text2, QStringLiteral("123"));
     QTest::mouseClick(view.Command1, Qt::LeftButton);
-    ASSERT_EQ(boxes.size(), 4u);
-    EXPECT_EQ(boxes[2], "ERROR!: More last add's than titels!\nExport the list without lastadd's");
-    EXPECT_EQ(boxes[3], "Done: Export done!");
+    EXPECT_EQ(boxes.take(),
+              (std::vector<std::string>{"ERROR!: More last add's than titels!\nExport "
+                                        "the list without lastadd's",
+                                        "Done: Export done!"}));
     EXPECT_FALSE(view.Check_lastadd->isChecked());
 
     // The close box saves the settings, the amount cut to two characters, and gives the main
@@ -116,7 +106,6 @@ TEST(ExportDialogOnQt, ExportsTextAndHtmlAndSavesOnTheCloseBox) {
         }
         EXPECT_TRUE(std::filesystem::exists(chosen + "/Canci\xC3\xB3nes.html"));
     }
-    ui::qt::QtPlatform::setAnswerHook(nullptr);
 }
 
 }  // namespace

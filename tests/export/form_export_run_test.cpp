@@ -86,26 +86,10 @@ TEST(ExportRun, TheListsFlagDecidesTheInformationColumn) {
     }
 }
 
-TEST(ExportRun, LastAddedAboveOrBelowEverythingOrRefusedAndSavedCleared) {
+// Where the section goes is the builders' and the end-to-end run's; here the refusal.
+TEST(ExportRun, TooManyLastAddedAreRefusedAndTheClearedBoxSaved) {
     OpenMovies f;
-    f.main.folder.put("Movies.top", "TOP\r\n");
     f.dialog.Check_lastadd.userToggle();
-    f.dialog.Text2.setText("2");
-    ASSERT_TRUE(f.dialog.Combo1.setText("Top"));
-    f.exportNow();
-    const std::string top = f.out.get("Movies.TXT");
-    EXPECT_TRUE(top.starts_with("\r\n  __|_____________")) << top.substr(0, 80);
-    EXPECT_NE(top.find("|  2 |amelie"), std::string::npos);
-    EXPECT_NE(top.find("------'\r\n\r\nTOP\r\n.[Movies]"), std::string::npos);
-
-    ASSERT_TRUE(f.dialog.Combo1.setText("Bottom"));
-    f.exportNow();
-    const std::string bottom = f.out.get("Movies.TXT");
-    EXPECT_TRUE(bottom.starts_with("TOP\r\n.[Movies]"));
-    EXPECT_NE(bottom.find("--------'\r\n\r\n  __|_____________"), std::string::npos);
-    EXPECT_TRUE(bottom.ends_with("------'\r\n" + std::string(36, ' ') +
-                                 std::string(exporting::kCreditText) + "\r\n\r\n"));
-
     // More than the titles: refused, the box cleared, the report written without the section,
     // and the cleared box saved at closing.
     f.dialog.Text2.setText("11");

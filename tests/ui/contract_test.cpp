@@ -13,9 +13,7 @@
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
-#include <deque>
-#include <map>
-#include <memory>
+#include <QTimer>
 #include <tuple>
 
 #include "tests/support/memory/memory_controls.h"
@@ -26,6 +24,7 @@
 namespace {
 
 using namespace ui;
+using Strings = std::vector<std::string>;
 
 // Types text the way a keyboard does, one key press per character, any character included;
 // "\b" is the backspace key.
@@ -39,80 +38,61 @@ void typeText(QWidget* widget, const QString& text) {
     }
 }
 
+// One control of each kind, with what a user does to it.
 struct MemoryBackend {
     memory::MemoryWindow window;
-    std::deque<memory::MemoryListBox> lists;
-    std::deque<memory::MemoryComboBox> combos;
-    std::deque<memory::MemoryTextBox> texts;
-    memory::MemoryDriveList driveList{{"/", "/tmp"}};
+    memory::MemoryListBox list;
+    memory::MemoryComboBox combo;
+    memory::MemoryTextBox text;
+    memory::MemoryDriveList drives{{"/", "/tmp"}};
 
-    auto& list() { return lists.emplace_back(); }
-    auto& combo() { return combos.emplace_back(); }
-    auto& text() { return texts.emplace_back(); }
-    Window& win() { return window; }
-    DriveList& drives() { return driveList; }
     std::string otherDrive() { return "/tmp"; }
-    void select(memory::MemoryListBox& box, int index) { box.userSelect(index); }
-    std::vector<std::string> displayed(memory::MemoryListBox& box) { return box.items(); }
+    void select(int index) { list.userSelect(index); }
+    Strings displayed() { return list.items(); }
     void type(auto& box, const std::string& keys) { box.type(keys); }
-    void selectAll(memory::MemoryComboBox& box) { box.userSelectAll(); }
+    void selectAll() { combo.userSelectAll(); }
     void closeBox() { window.userClose(); }
 };
 
 struct QtBackend {
     QWidget top;
-    std::deque<qt::QtListBox> lists;
-    std::deque<qt::QtComboBox> combos;
-    std::deque<qt::QtTextBox> texts;
-    std::map<const void*, QWidget*> widgetOf;  // adapter -> the widget a user works with
+    QListWidget* listWidget = new QListWidget(&top);
+    QComboBox* comboWidget = editable(new QComboBox(&top));
+    QLineEdit* textWidget = new QLineEdit(&top);
     qt::QtWindow window{&top};
-    qt::QtDriveList driveList{new QComboBox(&top)};
+    qt::QtListBox list{listWidget};
+    qt::QtComboBox combo{comboWidget};
+    qt::QtTextBox text{textWidget};
+    qt::QtDriveList drives{new QComboBox(&top)};
 
-    // Keyed by the interface the tests hold, whose address may differ from the adapter's.
-    template <class Face, class Adapter, class Widget>
-    Face& add(std::deque<Adapter>& adapters, Widget* widget) {
-        Face& face = adapters.emplace_back(widget);
-        widgetOf[&face] = widget;
-        return face;
+    QtBackend() { listWidget->setGeometry(0, 0, 200, 300); }
+    static QComboBox* editable(QComboBox* box) {
+        box->setEditable(true);
+        return box;
     }
-    ListBox& list() {
-        auto* widget = new QListWidget(&top);
-        widget->setGeometry(0, 0, 200, 300);
-        return add<ListBox>(lists, widget);
-    }
-    ComboBox& combo() {
-        auto* widget = new QComboBox(&top);
-        widget->setEditable(true);
-        return add<ComboBox>(combos, widget);
-    }
-    TextBox& text() { return add<TextBox>(texts, new QLineEdit(&top)); }
-    Window& win() { return window; }
-    DriveList& drives() { return driveList; }
     std::string otherDrive() {
-        for (const auto& drive : driveList.drives()) {
-            if (drive != driveList.drive()) return drive;
+        for (const auto& drive : drives.drives()) {
+            if (drive != drives.drive()) return drive;
         }
         return {};
     }
-
-    std::vector<std::string> displayed(ListBox& box) {
-        auto* widget = static_cast<QListWidget*>(widgetOf.at(&box));
-        std::vector<std::string> texts;
-        for (int i = 0; i < widget->count(); ++i)
-            texts.push_back(qt::fromQt(widget->item(i)->text()));
+    void select(int index) {
+        QTest::mouseClick(listWidget->viewport(), Qt::LeftButton, {},
+                          listWidget->visualItemRect(listWidget->item(index)).center());
+    }
+    Strings displayed() {
+        Strings texts;
+        for (int i = 0; i < listWidget->count(); ++i) {
+            texts.push_back(qt::fromQt(listWidget->item(i)->text()));
+        }
         return texts;
     }
-    void select(ListBox& box, int index) {
-        auto* widget = static_cast<QListWidget*>(widgetOf.at(&box));
-        const QRect where = widget->visualItemRect(widget->item(index));
-        QTest::mouseClick(widget->viewport(), Qt::LeftButton, {}, where.center());
+    void type(const TextBox&, const std::string& keys) { typeText(textWidget, latin1(keys)); }
+    void type(const ComboBox&, const std::string& keys) { typeText(comboWidget, latin1(keys)); }
+    static QString latin1(const std::string& keys) {
+        return QString::fromLatin1(keys.data(), std::ssize(keys));
     }
-    void type(const auto& box, const std::string& keys) {
-        typeText(widgetOf.at(&box), QString::fromLatin1(keys.data(), std::ssize(keys)));
-    }
-    void selectAll(ComboBox& box) {
-        static_cast<QComboBox*>(widgetOf.at(&box))->lineEdit()->selectAll();
-    }
+    void selectAll() { comboWidget->lineEdit()->selectAll(); }
     void closeBox() { top.close(); }
 };
 
@@ -126,20 +106,19 @@ using Backends = ::testing::Types<MemoryBackend, QtBackend>;
 TYPED_TEST_SUITE(ControlContract, Backends);
 
 TYPED_TEST(ControlContract, ListBoxKeepsOneOrderAndOneSelectionAndClicksForTheUserOnly) {
-    auto& list = this->b.list();
+    ListBox& list = this->b.list;
     int clicks = 0;
     list.onClick = [&] { ++clicks; };
     // What the window logic reads back, and the same as the user sees it.
     const auto items = [&] {
-        std::vector<std::string> seen;
+        Strings seen;
         for (int i = 0; i < list.count(); ++i) seen.push_back(list.itemText(i));
-        EXPECT_EQ(this->b.displayed(list), seen);
+        EXPECT_EQ(this->b.displayed(), seen);
         return seen;
     };
     list.setItems({"b", "abc", "ABD", "Abc", "\xE9t\xE9", "\xC9T\xC9", "z"});
     list.addItem("aB");
-    EXPECT_EQ(items(), (std::vector<std::string>{"aB", "Abc", "abc", "ABD", "b", "z", "\xC9T\xC9",
-                                                 "\xE9t\xE9"}));
+    EXPECT_EQ(items(), (Strings{"aB", "Abc", "abc", "ABD", "b", "z", "\xC9T\xC9", "\xE9t\xE9"}));
     list.setSelected(2, true);
     list.setSelected(4, true);
     for (int i = 0; i < list.count(); ++i) EXPECT_EQ(list.selected(i), i == 4) << i;
@@ -149,21 +128,20 @@ TYPED_TEST(ControlContract, ListBoxKeepsOneOrderAndOneSelectionAndClicksForTheUs
     // nothing selected.
     list.setItems({"z", "b", "ABD", "Abc", "abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9"});
     list.setItems({"z", "b", "ABD", "Abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9", "c"});
-    EXPECT_EQ(items(), (std::vector<std::string>{"aB", "Abc", "ABD", "b", "c", "new", "z",
-                                                 "\xC9T\xC9", "\xE9t\xE9"}));
+    EXPECT_EQ(items(),
+              (Strings{"aB", "Abc", "ABD", "b", "c", "new", "z", "\xC9T\xC9", "\xE9t\xE9"}));
     for (int i = 0; i < list.count(); ++i) EXPECT_FALSE(list.selected(i)) << i;
     EXPECT_EQ(clicks, 0);
-    this->b.select(list, 2);
-    EXPECT_EQ(clicks, 1);
-    this->b.select(list, 0);
+    this->b.select(2);
+    this->b.select(0);
     EXPECT_EQ(clicks, 2);
     for (int i = 0; i < list.count(); ++i) EXPECT_EQ(list.selected(i), i == 0) << i;
     list.clear();
-    EXPECT_EQ(clicks, 2);
+    EXPECT_EQ(std::pair(clicks, list.count()), std::pair(2, 0));
 }
 
 TYPED_TEST(ControlContract, TextBoxRefusesTypingBeyondItsLengthButKeepsAssignedText) {
-    auto& box = this->b.text();
+    auto& box = this->b.text;
     box.setMaxLength(4);
     this->b.type(box, "abcdef");
     EXPECT_EQ(box.text(), "abcd");
@@ -176,7 +154,7 @@ TYPED_TEST(ControlContract, TextBoxRefusesTypingBeyondItsLengthButKeepsAssignedT
 }
 
 TYPED_TEST(ControlContract, ComboBoxKeyHandlerCanDiscardKeys) {
-    auto& box = this->b.combo();
+    auto& box = this->b.combo;
     box.setItems({"first", "second"});
     std::vector<int> keys;
     box.onKeyPress = [&](int& key) {
@@ -189,16 +167,19 @@ TYPED_TEST(ControlContract, ComboBoxKeyHandlerCanDiscardKeys) {
     this->b.type(box, "\bz");
     EXPECT_EQ(box.text(), "abz");
     EXPECT_EQ(keys, (std::vector<int>{'a', 'b', 'c', 'd', 'e', 8, 'z'}));
-    this->b.selectAll(box);  // a key typed over the selection replaces it
+    this->b.selectAll();  // a key typed over the selection replaces it
     this->b.type(box, "q");
     EXPECT_EQ(box.text(), "q");
+    box.setEnabled(false);  // a disabled box takes no typing
+    this->b.type(box, "x");
+    EXPECT_EQ(std::pair(box.text(), box.isEnabled()), std::pair(std::string("q"), false));
     box.setText("assigned by code, past any limit");
     EXPECT_EQ(box.text(), "assigned by code, past any limit");
     EXPECT_EQ(box.itemCount(), 2);
 }
 
 TYPED_TEST(ControlContract, WindowLoadsOnFirstShowAndUnloadsOnEveryClosing) {
-    ui::Window& window = this->b.win();
+    Window& window = this->b.window;
     int loads = 0, unloads = 0;
     window.onLoad = [&] { ++loads; };
     window.onUnload = [&] { ++unloads; };
@@ -215,60 +196,59 @@ TYPED_TEST(ControlContract, WindowLoadsOnFirstShowAndUnloadsOnEveryClosing) {
 }
 
 TYPED_TEST(ControlContract, DriveChangeFiresForCodeToo) {
-    ui::DriveList& drives = this->b.drives();
+    DriveList& drives = this->b.drives;
     const std::string other = this->b.otherDrive();
     if (other.empty()) GTEST_SKIP() << "only one mounted volume here";
     int changes = 0;
     drives.onChange = [&] { ++changes; };
     EXPECT_TRUE(drives.setDrive(other));
-    EXPECT_EQ(drives.drive(), other);
-    EXPECT_EQ(changes, 1);
     EXPECT_FALSE(drives.setDrive("no such volume"));
-    EXPECT_EQ(drives.drive(), other);
+    EXPECT_EQ(std::pair(drives.drive(), changes), std::pair(other, 1));
 }
 
 TEST(MessageStyles, StylesMapToButtonsIconsAndDefaults) {
-    struct Case {
-        int style;
-        QMessageBox::Icon icon;
-        bool yesNo;
-        QMessageBox::StandardButton defaultButton;
+    using Box = QMessageBox;
+    // The style, then the box's icon, whether it asks Yes/No and its default button.
+    const std::tuple<int, Box::Icon, bool, Box::StandardButton> cases[] = {
+        {16, Box::Critical, false, Box::Ok}, {64, Box::Information, false, Box::Ok},
+        {4, Box::NoIcon, true, Box::Yes},    {260, Box::NoIcon, true, Box::No},
+        {308, Box::Warning, true, Box::No},
     };
-    const Case cases[] = {
-        {16, QMessageBox::Critical, false, QMessageBox::Ok},
-        {64, QMessageBox::Information, false, QMessageBox::Ok},
-        {4, QMessageBox::NoIcon, true, QMessageBox::Yes},
-        {260, QMessageBox::NoIcon, true, QMessageBox::No},
-        {308, QMessageBox::Warning, true, QMessageBox::No},
-    };
-    ui::qt::QtPlatform platform;
-    for (const Case& c : cases) {
-        bool seen = false;
-        ui::qt::QtPlatform::setAnswerHook([&](QMessageBox& box) {
-            seen = true;
-            EXPECT_EQ(box.icon(), c.icon) << c.style;
-            EXPECT_EQ(box.windowTitle(), QStringLiteral("T\xE9tel"));
-            EXPECT_EQ(box.text(), QStringLiteral("line one\nline two"));
-            const bool yesNo = box.button(QMessageBox::Yes) && box.button(QMessageBox::No) &&
-                               !box.button(QMessageBox::Ok);
-            EXPECT_EQ(yesNo, c.yesNo) << c.style;
-            EXPECT_EQ(box.defaultButton(), box.button(c.defaultButton)) << c.style;
-            return yesNo ? ui::Answer::No : ui::Answer::Ok;
+    qt::QtPlatform platform;
+    for (const auto& [style, icon, yesNo, defaultButton] : cases) {
+        std::optional<std::tuple<Box::Icon, bool, bool, QString, QString>> seen;
+        qt::QtPlatform::setAnswerHook([&](Box& box) {
+            const bool asks = box.button(Box::Yes) && box.button(Box::No) && !box.button(Box::Ok);
+            seen.emplace(
+                box.icon(), asks,
+                static_cast<QAbstractButton*>(box.defaultButton()) == box.button(defaultButton),
+                box.windowTitle(), box.text());
+            return asks ? Answer::No : Answer::Ok;
         });
-        const ui::Answer answer = platform.messageBox("line one\r\nline two", c.style, "T\xE9tel");
-        EXPECT_TRUE(seen);
-        EXPECT_EQ(answer, c.yesNo ? ui::Answer::No : ui::Answer::Ok);
+        const Answer answer = platform.messageBox("line one\r\nline two", style, "T\xE9tel");
+        EXPECT_EQ(seen, std::tuple(icon, yesNo, true, QStringLiteral("T\xE9tel"),
+                                   QStringLiteral("line one\nline two")))
+            << style;
+        EXPECT_EQ(answer, yesNo ? Answer::No : Answer::Ok);
     }
-    ui::qt::QtPlatform::setAnswerHook(nullptr);
+    qt::QtPlatform::setAnswerHook(nullptr);
 }
 
-TEST(MemoryMessageBoxes, AnUnscriptedBoxFailsTheTest) {
-    ui::memory::MemoryPlatform platform;
-    EXPECT_THROW(platform.messageBox("surprise", 16, "Error"), ui::memory::UnscriptedMessageBox);
-    platform.answer(ui::Answer::Yes);
-    EXPECT_EQ(platform.messageBox("sure?", 4, "Change item"), ui::Answer::Yes);
-    ASSERT_EQ(platform.shown().size(), 2u);
-    EXPECT_EQ(platform.shown()[1].style, 4);
+// Without a hook the box waits for the user, and the answer is the button pressed.
+TEST(MessageStyles, TheShownBoxAnswersTheButtonPressed) {
+    qt::QtPlatform platform;
+    for (const auto& [style, pressed, answer] : {std::tuple{4, QMessageBox::No, Answer::No},
+                                                 {4, QMessageBox::Yes, Answer::Yes},
+                                                 {16, QMessageBox::Ok, Answer::Ok}}) {
+        QTimer presser;
+        QObject::connect(&presser, &QTimer::timeout, [button = pressed] {
+            if (auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget())) {
+                box->button(button)->click();
+            }
+        });
+        presser.start(10);
+        EXPECT_EQ(platform.messageBox("Sure?", style, "Question"), answer) << style;
+    }
 }
 
 TEST(QtShortDate, IsAsciiDigitsInTheLocalesOrderNeverAMonthNameOrOtherDigits) {
@@ -287,29 +267,26 @@ TEST(QtShortDate, IsAsciiDigitsInTheLocalesOrderNeverAMonthNameOrOtherDigits) {
 
 TEST(QtTextEntry, TextTheFilesCannotHoldIsRefusedWholeWithABeep) {
     QtBackend b;
-    ui::TextBox& box = b.text();
-    ui::ComboBox& combo = b.combo();
-    combo.setText("");
+    b.combo.setText("");
     int beeps = 0;
     qt::setRefusalHook([&] { ++beeps; });
-    auto* edit = static_cast<QLineEdit*>(b.widgetOf.at(&box));
     // a, euro, e-acute typed: the euro alone is refused, each time with a beep.
-    typeText(edit, QString::fromUtf8("a\xE2\x82\xAC\xC3\xA9"));
-    typeText(b.widgetOf.at(&combo), QString::fromUtf8("b\xE2\x82\xAC\xC3\xB1"));
-    EXPECT_EQ(std::make_tuple(box.text(), combo.text(), beeps),
+    typeText(b.textWidget, QString::fromUtf8("a\xE2\x82\xAC\xC3\xA9"));
+    typeText(b.comboWidget, QString::fromUtf8("b\xE2\x82\xAC\xC3\xB1"));
+    EXPECT_EQ(std::make_tuple(b.text.text(), b.combo.text(), beeps),
               std::make_tuple("a\xE9", "b\xF1", 2));
     // Pasted text holding a euro sign or a line break is refused whole; Latin-1 gets in.
     for (const char* pasted : {"x\xE2\x82\xACy", "two\r\nlines", "\xC3\xA4\xC3\x98\xC3\x9F"}) {
         QApplication::clipboard()->setText(QString::fromUtf8(pasted));
-        edit->paste();
+        b.textWidget->paste();
     }
-    EXPECT_EQ(std::make_tuple(box.text(), beeps), std::make_tuple("a\xE9\xE4\xD8\xDF", 4));
+    EXPECT_EQ(std::make_tuple(b.text.text(), beeps), std::make_tuple("a\xE9\xE4\xD8\xDF", 4));
     // A control character the program put there does not stop further typing.
-    box.setText("tab\there");
-    combo.setText("tab\there");
-    typeText(edit, "!");
-    typeText(b.widgetOf.at(&combo), "!");
-    EXPECT_EQ(std::make_tuple(box.text(), combo.text(), beeps),
+    b.text.setText("tab\there");
+    b.combo.setText("tab\there");
+    b.type(b.text, "!");
+    b.type(b.combo, "!");
+    EXPECT_EQ(std::make_tuple(b.text.text(), b.combo.text(), beeps),
               std::make_tuple("tab\there!", "tab\there!", 4));
     qt::setRefusalHook(nullptr);
 }

@@ -10,13 +10,7 @@
 namespace ui::memory {
 
 namespace {
-
 const TextBox* focused = nullptr;
-
-bool lessItem(const std::string& a, const std::string& b) {
-    return list_order::itemLess(a, b);
-}
-
 }  // namespace
 
 void MemoryWindow::show() {
@@ -25,14 +19,12 @@ void MemoryWindow::show() {
         return;
     }
     loaded_ = true;
-    ++loadCount_;
     if (onLoad) onLoad();
 }
 
 void MemoryWindow::unload() {
     if (!loaded_) return;
     loaded_ = false;  // an unload handler that closes the window again must not run twice
-    ++unloadCount_;
     if (onUnload) onUnload();
 }
 
@@ -43,7 +35,7 @@ bool MemoryButton::click() {
 }
 
 void MemoryListBox::addItem(const std::string& text) {
-    const auto at = std::upper_bound(items_.begin(), items_.end(), text, lessItem);
+    const auto at = std::upper_bound(items_.begin(), items_.end(), text, list_order::itemLess);
     const int index = static_cast<int>(at - items_.begin());
     items_.insert(at, text);
     if (selected_ >= index) ++selected_;

@@ -26,15 +26,11 @@ class MemoryWindow : public Window {
     void userClose() { unload(); }
     const std::string& caption() const { return caption_; }
     int frontCount() const { return frontCount_; }
-    int loadCount() const { return loadCount_; }
-    int unloadCount() const { return unloadCount_; }
 
   private:
     bool loaded_ = false;
     bool enabled_ = true;
     int frontCount_ = 0;
-    int loadCount_ = 0;
-    int unloadCount_ = 0;
     std::string caption_;
 };
 
@@ -79,7 +75,7 @@ class MemoryListBox : public ListBox, public Owned {
     std::string itemText(int index) const override;
     bool selected(int index) const override { return index == selected_; }
     void setSelected(int index, bool selected) override;
-    void refresh() override { ++refreshCount_; }
+    void refresh() override {}
 
     // The user selects an item; fires onClick when the selection changes.
     bool userSelect(int index);
@@ -87,12 +83,10 @@ class MemoryListBox : public ListBox, public Owned {
     bool userSelect(const std::string& text);
     int selectedIndex() const { return selected_; }
     const std::vector<std::string>& items() const { return items_; }
-    int refreshCount() const { return refreshCount_; }
 
   private:
     std::vector<std::string> items_;
     int selected_ = -1;
-    int refreshCount_ = 0;
 };
 
 class MemoryComboBox : public ComboBox, public Owned {
@@ -176,13 +170,11 @@ class MemoryDirList : public DirList, public Owned {
     std::string path_ = "/";
 };
 
-// A message box that a test did not script. Deliberately not a std::exception, so that no
-// handler guard can swallow it: the test fails.
-// Thrown by a message box shown while the busy pointer is on.
+// Thrown by a message box shown while the busy pointer is on, or one that a test did not script.
+// Deliberately not std::exceptions, so that no handler guard can swallow them: the test fails.
 struct MessageBoxWhileBusy {
     std::string prompt;
 };
-
 struct UnscriptedMessageBox {
     std::string prompt;
     std::string title;
@@ -201,24 +193,21 @@ class MemoryPlatform : public Platform {
     void answer(Answer next) { answers_.push_back(next); }
     Answer messageBox(const std::string& prompt, int style, const std::string& title) override;
     void beep() override { ++beeps_; }
-    std::string shortDate() override { return date_; }
+    std::string shortDate() override { return "06.12.2026"; }
     void beginBusy() override;
     void endBusy() override { --busyDepth_; }
     void endProgram(int status) override;
 
-    void setDate(const std::string& date) { date_ = date; }
     const std::vector<Shown>& shown() const { return shown_; }
     int beeps() const { return beeps_; }
     int busyDepth() const { return busyDepth_; }
     int busyCount() const { return busyCount_; }
     bool ended() const { return ended_; }
     int endStatus() const { return endStatus_; }
-    std::size_t unansweredCount() const { return answers_.size(); }
 
   private:
     std::deque<Answer> answers_;
     std::vector<Shown> shown_;
-    std::string date_ = "06.12.2026";
     int beeps_ = 0;
     int busyDepth_ = 0;
     int busyCount_ = 0;

@@ -1,0 +1,89 @@
+#pragma once
+// A user's hands on the program's Qt widgets, and the message boxes the user answers: shared by
+// the suites that drive the real windows offscreen.
+#include <gtest/gtest.h>
+
+#include <QAbstractButton>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QFileSystemModel>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QMessageBox>
+#include <QPushButton>
+#include <QTest>
+#include <QTreeView>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "ui/qt/qt_controls.h"
+#include "ui/qt/qt_platform.h"
+
+namespace qt_user {
+
+// Answers every message box as a user going on does (Yes, or OK) and keeps it as "title: text";
+// a box the user could not click fails the test.
+struct Boxes {
+    Boxes() {
+        ui::qt::QtPlatform::setAnswerHook([this](QMessageBox& box) {
+            shown.push_back(ui::qt::fromQt(box.windowTitle() + ": " + box.text()));
+            EXPECT_TRUE(box.isEnabled()) << shown.back();
+            return box.button(QMessageBox::Yes) ? ui::Answer::Yes : ui::Answer::Ok;
+        });
+    }
+    ~Boxes() { ui::qt::QtPlatform::setAnswerHook(nullptr); }
+    // The boxes shown since the last call.
+    std::vector<std::string> take() { return std::exchange(shown, {}); }
+    std::vector<std::string> shown;
+};
+using Shown = std::vector<std::string>;
+
+// A user's hands on the program's widgets.
+inline void click(QAbstractButton* button) {
+    ASSERT_TRUE(button->isVisible() && button->isEnabled()) << button->text().toStdString();
+    QTest::mouseClick(button, Qt::LeftButton);
+}
+
+inline void pick(QListWidget* list, const QString& text) {
+    const auto found = list->findItems(text, Qt::MatchExactly);
+    ASSERT_EQ(found.size(), 1) << text.toStdString();
+    list->scrollToItem(found.front());
+    QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
+                      list->visualItemRect(found.front()).center());
+    ASSERT_TRUE(found.front()->isSelected()) << text.toStdString();
+}
+
+// Empties a text field (a combo box's own line) with End and Backspace, then types `latin1`
+// key by key. QTest's own typing knows only ASCII keys, so every letter is sent as its key
+// carrying its text, as a keyboard sends them.
+inline void retype(QWidget* field, const char* latin1) {
+    auto* line = qobject_cast<QLineEdit*>(field);
+    if (line == nullptr) line = static_cast<QComboBox*>(field)->lineEdit();
+    line->setFocus();
+    QTest::keyClick(line, Qt::Key_End);
+    for (qsizetype n = line->text().size(); n > 0; --n) QTest::keyClick(line, Qt::Key_Backspace);
+    for (QChar c : QString::fromLatin1(latin1)) {
+        const auto key = static_cast<Qt::Key>(c.toUpper().unicode());
+        QTest::sendKeyEvent(QTest::Press, line, key, QString(c), Qt::NoModifier);
+        QTest::sendKeyEvent(QTest::Release, line, key, QString(c), Qt::NoModifier);
+    }
+}
+
+// Clicks a folder shown in a folder list, once the list has read it from disk.
+inline void pickFolder(QTreeView* tree, const std::string& path) {
+    auto* model = static_cast<QFileSystemModel*>(tree->model());
+    QModelIndex index;
+    const bool shown = QTest::qWaitFor(
+        [&] {
+            index = model->index(QString::fromStdString(path));
+            if (!index.isValid()) return false;
+            tree->scrollTo(index);
+            return !tree->visualRect(index).isEmpty();
+        },
+        10000);
+    ASSERT_TRUE(shown) << path << " never shown in the folder list";
+    QTest::mouseClick(tree->viewport(), Qt::LeftButton, {}, tree->visualRect(index).center());
+}
+
+}  // namespace qt_user
