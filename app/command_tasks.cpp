@@ -113,13 +113,13 @@ std::string exportBytes(const CommandLine& line, catalogue::Store& store, const 
     exporting::ReportChoices choices = savedChoices(store);
     choices.articleNumbers = line.articleNumbers;
     const std::string date = choices.date ? ui::qt::QtPlatform().shortDate() : std::string();
-    const exporting::ListReport report =
+    exporting::ListReport report =
         exporting::buildListReport(store, list, exporting::listTitles(store, list), choices, date);
     if (report.lastAddedRefused) {
         err << "pemla: the export settings ask for more last added titles than the list holds; "
                "the report leaves that section out.\n";
     }
-    return exporting::reportFileBytes(list, report.text, line.html);
+    return exporting::reportFileBytes(list, std::move(report.text), line.html);
 }
 
 std::string readWholeFile(const std::string& path) {

@@ -112,6 +112,10 @@ long exportPeakKilobytes() {
         ::getrusage(RUSAGE_SELF, &usage);
         const long peak = w.platform.shown().back().prompt == "Export done!" ? usage.ru_maxrss : -1;
         [[maybe_unused]] const auto wrote = ::write(pipeEnds[1], &peak, sizeof peak);
+        // _exit() runs no destructor: the world's folder is removed here, or every run leaves
+        // a generated catalogue behind in the temporary folder.
+        std::error_code ec;
+        std::filesystem::remove_all(w.folder, ec);
         ::_exit(0);
     }
     ::close(pipeEnds[1]);

@@ -1,5 +1,7 @@
 #include "catalogue/csv.h"
 
+#include "catalogue/byte_scan.h"
+
 namespace catalogue {
 
 std::string csvField(std::string_view value) {
@@ -25,67 +27,85 @@ std::string csvRow(const std::vector<std::string>& fields) {
     return row;
 }
 
-std::vector<CsvRecord> parseCsv(std::string_view text) {
-    std::vector<CsvRecord> records;
-    std::size_t at = 0;
-    long line = 1;
-    // Steps over the line end at `at` (CR LF, LF or CR), counting the line.
-    auto skipLineEnd = [&] {
-        if (text[at] == '\r' && at + 1 < text.size() && text[at + 1] == '\n') ++at;
-        ++at;
-        ++line;
+std::size_t CsvReader::plainEnd(std::size_t from) const {
+    return findAnyOf<',', '\r', '\n'>(text_, from);
+}
+
+void CsvReader::skipLineEnd() {
+    if (text_[at_] == '\r' && at_ + 1 < text_.size() && text_[at_ + 1] == '\n') ++at_;
+    ++at_;
+    ++line_;
+}
+
+std::string_view CsvReader::quotedField() {
+    const std::size_t size = text_.size();
+    std::size_t from = ++at_;  // the first byte not yet taken into the field
+    std::size_t kept = std::string::npos;
+    // A field that cannot be a view of the text is gathered in unquoted_. Reserved once for the
+    // whole text, so that the views of a record's earlier fields are never moved.
+    auto keep = [&](std::string_view piece) {
+        if (kept == std::string::npos) {
+            if (unquoted_.capacity() < size) unquoted_.reserve(size);
+            kept = unquoted_.size();
+        }
+        unquoted_.append(piece);
     };
-    while (at < text.size()) {
-        if (text[at] == '\r' || text[at] == '\n') {
-            skipLineEnd();  // an empty line
+    std::string_view piece;
+    for (;;) {
+        std::size_t i = findAnyOf<'"', '\r', '\n'>(text_, from);
+        for (; i < size && text_[i] != '"'; i = findAnyOf<'"', '\r', '\n'>(text_, i + 1)) {
+            // A line break inside quotes belongs to the field, but still counts a line.
+            if (text_[i] == '\n' || i + 1 >= size || text_[i + 1] != '\n') ++line_;
+        }
+        if (i >= size) {
+            unclosedQuote_ = true;
+            piece = text_.substr(from);
+            at_ = size;
+            break;
+        }
+        if (i + 1 < size && text_[i + 1] == '"') {
+            keep(text_.substr(from, i + 1 - from));  // up to and with one of the two quotes
+            from = i + 2;
             continue;
         }
-        CsvRecord record;
-        record.line = line;
-        std::string field;
-        bool ended = false;
-        while (!ended) {
-            if (at < text.size() && text[at] == '"') {
-                ++at;
-                for (;;) {
-                    if (at >= text.size()) {
-                        record.unclosedQuote = true;
-                        break;
-                    }
-                    const char c = text[at];
-                    if (c == '"') {
-                        if (at + 1 < text.size() && text[at + 1] == '"') {
-                            field.push_back('"');
-                            at += 2;
-                            continue;
-                        }
-                        ++at;
-                        break;
-                    }
-                    // A line break inside quotes belongs to the field, but still counts a line.
-                    if (c == '\n' ||
-                        (c == '\r' && (at + 1 >= text.size() || text[at + 1] != '\n'))) {
-                        ++line;
-                    }
-                    field.push_back(c);
-                    ++at;
-                }
-            }
-            while (at < text.size() && text[at] != ',' && text[at] != '\r' && text[at] != '\n') {
-                field.push_back(text[at++]);
-            }
-            record.fields.push_back(std::move(field));
-            field.clear();
-            if (at < text.size() && text[at] == ',') {
-                ++at;
-            } else {
-                if (at < text.size()) skipLineEnd();
-                ended = true;
-            }
-        }
-        records.push_back(std::move(record));
+        piece = text_.substr(from, i - from);
+        at_ = i + 1;
+        break;
     }
-    return records;
+    const std::size_t end = plainEnd(at_);
+    if (kept == std::string::npos && end == at_) return piece;
+    keep(piece);
+    keep(text_.substr(at_, end - at_));
+    at_ = end;
+    return std::string_view(unquoted_).substr(kept);
+}
+
+bool CsvReader::next() {
+    while (at_ < text_.size() && (text_[at_] == '\r' || text_[at_] == '\n')) {
+        skipLineEnd();  // an empty line
+    }
+    if (at_ >= text_.size()) return false;
+    fields_.clear();
+    unquoted_.clear();
+    unclosedQuote_ = false;
+    recordLine_ = line_;
+    recordStart_ = at_;
+    for (;;) {
+        if (at_ < text_.size() && text_[at_] == '"') {
+            fields_.push_back(quotedField());
+        } else {
+            const std::size_t end = plainEnd(at_);
+            fields_.push_back(text_.substr(at_, end - at_));
+            at_ = end;
+        }
+        if (at_ < text_.size() && text_[at_] == ',') {
+            ++at_;
+            continue;
+        }
+        recordEnd_ = at_;
+        if (at_ < text_.size()) skipLineEnd();
+        return true;
+    }
 }
 
 }  // namespace catalogue

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -18,15 +17,41 @@ std::string csvField(std::string_view value);
 // Fields joined by commas, ended by CR LF.
 std::string csvRow(const std::vector<std::string>& fields);
 
-struct CsvRecord {
-    long line = 0;  // the line of the file the record starts on, from 1
-    std::vector<std::string> fields;
-    bool unclosedQuote = false;  // a quoted field ran to the end of the file
-};
+// Reads CSV text one record at a time. Records end at CR LF, LF or CR outside quotes; a quoted
+// field may hold commas, line breaks and doubled quotes; text after a closing quote is kept.
+// Lines that hold nothing at all are no records. Never fails.
+//
+// Fields are views into the text itself, except a quoted field that had to be unquoted (a doubled
+// quote, text after the closing quote), which is a view into the reader's own buffer. Either
+// stays valid until the next call of next(); the text must outlive the reader.
+class CsvReader {
+  public:
+    explicit CsvReader(std::string_view text) : text_(text) {}
 
-// The records of CSV text. Records end at CR LF, LF or CR outside quotes; a quoted field may hold
-// commas, line breaks and doubled quotes; text after a closing quote is kept. Lines that hold
-// nothing at all are no records. Never fails.
-std::vector<CsvRecord> parseCsv(std::string_view text);
+    // Moves to the next record; false when the text holds no more.
+    bool next();
+
+    const std::vector<std::string_view>& fields() const { return fields_; }
+    // The line of the text the record starts on, from 1.
+    long line() const { return recordLine_; }
+    // Whether a quoted field of the record ran to the end of the text.
+    bool unclosedQuote() const { return unclosedQuote_; }
+    // The record as it stands in the text, without its line end.
+    std::string_view raw() const { return text_.substr(recordStart_, recordEnd_ - recordStart_); }
+
+  private:
+    std::size_t plainEnd(std::size_t from) const;
+    std::string_view quotedField();
+    void skipLineEnd();
+
+    std::string_view text_;
+    std::size_t at_ = 0;
+    long line_ = 1;
+    long recordLine_ = 0;
+    std::size_t recordStart_ = 0, recordEnd_ = 0;
+    bool unclosedQuote_ = false;
+    std::vector<std::string_view> fields_;
+    std::string unquoted_;
+};
 
 }  // namespace catalogue

@@ -1,5 +1,8 @@
 #include "catalogue/utf8.h"
 
+#include <cstdint>
+#include <cstring>
+
 namespace catalogue {
 
 std::string latin1ToUtf8(std::string_view latin1) {
@@ -53,15 +56,46 @@ std::optional<char32_t> decodeOne(std::string_view bytes, std::size_t& at) {
     return code;
 }
 
+// The first byte at or after `at` that is not ASCII, or the size. Reads eight bytes at a time:
+// most of the text is ASCII.
+std::size_t asciiEnd(std::string_view bytes, std::size_t at) {
+    constexpr std::uint64_t kHighBits = 0x8080808080808080u;
+    for (; at + 8 <= bytes.size(); at += 8) {
+        std::uint64_t word;
+        std::memcpy(&word, bytes.data() + at, 8);
+        if ((word & kHighBits) != 0) break;
+    }
+    while (at < bytes.size() && static_cast<unsigned char>(bytes[at]) < 0x80) ++at;
+    return at;
+}
+
 }  // namespace
 
+bool isAscii(std::string_view bytes) {
+    return asciiEnd(bytes, 0) == bytes.size();
+}
+
 bool isUtf8(std::string_view bytes) {
-    for (std::size_t at = 0; at < bytes.size();) {
-        if (static_cast<unsigned char>(bytes[at]) < 0x80) {
-            ++at;  // most of a file is ASCII
-        } else if (!decodeOne(bytes, at)) {
+    for (std::size_t at = asciiEnd(bytes, 0); at < bytes.size(); at = asciiEnd(bytes, at)) {
+        if (!decodeOne(bytes, at)) return false;
+    }
+    return true;
+}
+
+bool appendAsLatin1(std::string& out, std::string_view utf8, char32_t* outside) {
+    const std::size_t before = out.size();
+    for (std::size_t at = 0; at < utf8.size();) {
+        const std::size_t ascii = asciiEnd(utf8, at);
+        out.append(utf8.substr(at, ascii - at));
+        at = ascii;
+        if (at == utf8.size()) break;
+        const std::optional<char32_t> code = decodeOne(utf8, at);
+        if (!code || *code > 0xFF) {
+            if (outside != nullptr) *outside = code.value_or(0xFFFD);
+            out.resize(before);
             return false;
         }
+        out.push_back(static_cast<char>(*code));
     }
     return true;
 }
@@ -69,18 +103,7 @@ bool isUtf8(std::string_view bytes) {
 std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside) {
     std::string latin1;
     latin1.reserve(utf8.size());
-    for (std::size_t at = 0; at < utf8.size();) {
-        if (static_cast<unsigned char>(utf8[at]) < 0x80) {
-            latin1.push_back(utf8[at++]);
-            continue;
-        }
-        const std::optional<char32_t> code = decodeOne(utf8, at);
-        if (!code || *code > 0xFF) {
-            if (outside != nullptr) *outside = code.value_or(0xFFFD);
-            return std::nullopt;
-        }
-        latin1.push_back(static_cast<char>(*code));
-    }
+    if (!appendAsLatin1(latin1, utf8, outside)) return std::nullopt;
     return latin1;
 }
 

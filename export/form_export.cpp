@@ -177,7 +177,7 @@ void Form_Export::RunExport() {
             return;
         }
         try {
-            const std::string report = BuildReport(list);
+            std::string report = BuildReport(list);
             std::string folder = c_.Dir1.path();
             if (!folder.ends_with('/')) folder.push_back('/');
             c_.Text1.setText(folder);
@@ -185,7 +185,7 @@ void Form_Export::RunExport() {
             const std::string out = folder + catalogue::fileSystemName(list);
             const bool html = c_.Checkhtml.value() == 1;
             store_.writeReport(out + (html ? ".html" : ".TXT"),
-                               reportFileBytes(list, report, html));
+                               reportFileBytes(list, std::move(report), html));
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);
             main_.showError(error.file(), error.reason());

@@ -118,19 +118,26 @@ std::string placeLastAdded(std::string_view report, std::string_view section,
     return out;
 }
 
+std::optional<std::string> lastAddedFor(std::string_view entryText, const LastAddedRequest& request,
+                                        bool& refused) {
+    refused = false;
+    if (!request.include) return std::nullopt;
+    const double amount = lastAddedAmount(request.amountText);
+    if (amount > static_cast<double>(request.titleCount)) {
+        refused = true;
+        return std::nullopt;
+    }
+    const long rows = amount >= 1 ? static_cast<long>(std::floor(amount)) : 0;
+    return lastAddedSection(entryText, request.amountText, rows, request.information);
+}
+
 LastAddedResult BuildLastAdded(std::string_view entryText, std::string report,
                                const LastAddedRequest& request) {
     LastAddedResult result{std::move(report), false};
-    if (!request.include) return result;
-    const double amount = lastAddedAmount(request.amountText);
-    if (amount > static_cast<double>(request.titleCount)) {
-        result.refused = true;
-        return result;
+    if (const std::optional<std::string> section =
+            lastAddedFor(entryText, request, result.refused)) {
+        result.report = placeLastAdded(result.report, *section, request.position);
     }
-    const long rows = amount >= 1 ? static_cast<long>(std::floor(amount)) : 0;
-    const std::string section =
-        lastAddedSection(entryText, request.amountText, rows, request.information);
-    result.report = placeLastAdded(result.report, section, request.position);
     return result;
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -40,6 +41,11 @@ struct LastAddedResult {
     // clears Check_lastadd and shows kTooManyLastAdded.
     bool refused = false;
 };
+
+// The section the request asks for; nothing when it is not wanted, or when it is refused, which
+// sets `refused`. Never fails.
+std::optional<std::string> lastAddedFor(std::string_view entryText, const LastAddedRequest& request,
+                                        bool& refused);
 
 // The report with the section added as the request says, or unchanged when it is not wanted or
 // refused. Never fails.

@@ -42,15 +42,6 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list,
     options.date = choices.date;
     options.separatorLines = choices.separatorLines;
     options.counter = choices.counter;
-    std::string report = BuildReportTable(list, entries, articles, titles, options,
-                                          choices.date ? date : std::string_view());
-
-    // The top text is optional: a file that is missing or cannot be read is simply left out.
-    try {
-        if (auto top = store.readTextIfExists(catalogue::fileSystemName(list) + ".top"))
-            report.insert(0, *top);
-    } catch (const catalogue::CatalogueError&) {
-    }
 
     LastAddedRequest request;
     request.include = choices.lastAdded;
@@ -58,15 +49,35 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list,
     request.position = choices.position;
     request.information = options.information;
     request.titleCount = titles.size();
-    LastAddedResult withSection = BuildLastAdded(entries, std::move(report), request);
-    result.lastAddedRefused = withSection.refused;
-    result.text = std::move(withSection.report);
-    result.text.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
+    const std::optional<std::string> section =
+        lastAddedFor(entries, request, result.lastAddedRefused);
+    const bool sectionFirst = section && choices.position == "Top";
+
+    // The top text is optional: a file that is missing or cannot be read is simply left out.
+    std::string top;
+    try {
+        top = store.readTextIfExists(catalogue::fileSystemName(list) + ".top").value_or("");
+    } catch (const catalogue::CatalogueError&) {
+    }
+
+    // One buffer, in the report's order: the section placed on top (and an empty line), the top
+    // text, the table, the section placed below, the credit line; and room for the file's end.
+    std::string& out = result.text;
+    out.reserve((section ? section->size() : 0) + top.size() +
+                reportTableSize(titles.size(), options) + 128);
+    if (sectionFirst) out.append(*section).append(catalogue::kCrLf);
+    out.append(top);
+    appendReportTable(out, list, entries, articles, titles, options,
+                      choices.date ? date : std::string_view());
+    if (section && !sectionFirst) out.append(*section);
+    out.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
     return result;
 }
 
-std::string reportFileBytes(const std::string& list, const std::string& report, bool html) {
-    return html ? HtmlPage(list, report) : report + "\r\n";
+std::string reportFileBytes(const std::string& list, std::string report, bool html) {
+    if (html) return HtmlPage(list, report);
+    report.append(catalogue::kCrLf);
+    return report;
 }
 
 std::string listCsv(catalogue::Store& store, const std::string& list) {

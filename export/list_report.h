@@ -44,7 +44,7 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list,
                            std::string_view date);
 
 // The bytes of the report file: the HTML page, or the text followed by one more CR LF.
-std::string reportFileBytes(const std::string& list, const std::string& report, bool html);
+std::string reportFileBytes(const std::string& list, std::string report, bool html);
 
 // The list as CSV in UTF-8: the header "title,type,discs,information,article number", then one
 // row per title in the order the main window shows them, its fields and article number found as

@@ -1,6 +1,7 @@
 #include "export/report_table.h"
 
 #include <algorithm>
+#include <array>
 #include <string>
 
 #include "catalogue/file_text.h"
@@ -168,28 +169,50 @@ std::string padded(std::string_view text, std::size_t width) {
     return out;
 }
 
+std::size_t reportTableSize(std::size_t titles, const ReportOptions& options) {
+    return (titles * (options.separatorLines ? 2 : 1) + 4) * 82;
+}
+
 std::string BuildReportTable(std::string_view listName, std::string_view entryText,
                              std::string_view articleText, const std::vector<std::string>& titles,
                              const ReportOptions& options, std::string_view dateText) {
+    std::string out;
+    out.reserve(reportTableSize(titles.size(), options));
+    appendReportTable(out, listName, entryText, articleText, titles, options, dateText);
+    return out;
+}
+
+void appendReportTable(std::string& out, std::string_view listName, std::string_view entryText,
+                       std::string_view articleText, const std::vector<std::string>& titles,
+                       const ReportOptions& options, std::string_view dateText) {
     const Layout& layout = layoutFor(options);
     const EntryIndex entries(entryText);
     const ArticleIndex articles(options.articleNumbers ? articleText : std::string_view());
 
-    std::string out;
-    out.reserve((titles.size() * (options.separatorLines ? 2 : 1) + 4) * 82);
     topBorder(out, layout, listName, options, dateText);
     out.append(layout.header).append(kCrLf);
     out.append(layout.underline).append(kCrLf);
+    // Each title is looked up a few rows before its row is written, so that the memory its
+    // lookups need is fetched meanwhile.
+    constexpr std::size_t kAhead = 8;
+    std::array<std::size_t, kAhead> entryHash{}, articleHash{};
+    auto fetch = [&](std::size_t i) {
+        if (i >= titles.size()) return;
+        entryHash[i % kAhead] = entries.prefetch(titles[i]);
+        if (options.articleNumbers) articleHash[i % kAhead] = articles.prefetch(titles[i]);
+    };
+    for (std::size_t i = 0; i < kAhead; ++i) fetch(i);
     for (std::size_t i = 0; i < titles.size(); ++i) {
         const std::string_view title = titles[i];
-        row(out, options, title, entries.find(title),
-            options.articleNumbers ? articles.find(title) : std::string_view());
+        const std::size_t entry = entryHash[i % kAhead], article = articleHash[i % kAhead];
+        fetch(i + kAhead);
+        row(out, options, title, entries.find(title, entry),
+            options.articleNumbers ? articles.find(title, article) : std::string_view());
         if (options.separatorLines && i + 1 < titles.size()) {
             out.append(layout.underline).append(kCrLf);
         }
     }
     bottomLine(out, layout, options, titles.size());
-    return out;
 }
 
 }  // namespace exporting

@@ -25,6 +25,14 @@ std::string BuildReportTable(std::string_view listName, std::string_view entryTe
                              std::string_view articleText, const std::vector<std::string>& titles,
                              const ReportOptions& options, std::string_view dateText);
 
+// The same table appended to `out`, so that a report is written into one buffer.
+void appendReportTable(std::string& out, std::string_view listName, std::string_view entryText,
+                       std::string_view articleText, const std::vector<std::string>& titles,
+                       const ReportOptions& options, std::string_view dateText);
+
+// About how many bytes the table of `titles` rows takes.
+std::size_t reportTableSize(std::size_t titles, const ReportOptions& options);
+
 // `text` cut to its first `width` characters when longer.
 std::string firstChars(std::string_view text, std::size_t width);
 

@@ -1,8 +1,12 @@
 #pragma once
 
 #include <algorithm>
+#include <array>
+#include <cstdint>
+#include <cstring>
+#include <functional>
+#include <optional>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 #include "catalogue/file_text.h"
@@ -21,73 +25,174 @@ struct Fields {
     std::string_view information;
 };
 
+// Titles to values found through open addressing: built once per report, it costs no
+// allocation per title. A slot is eight bytes (part of the hash, and which record), so the table
+// of a full list stays in the processor's cache. The first value put in for a title stays.
+template <typename Value, typename Hash, typename Equal>
+class FlatTitleMap {
+  public:
+    explicit FlatTitleMap(std::size_t expected) {
+        std::size_t size = 64;
+        while (size < expected * 2) size *= 2;
+        slots_.resize(size);
+        records_.reserve(expected);
+    }
+
+    void putFirst(std::string_view title, const Value& value) {
+        const std::size_t hash = Hash{}(title);
+        std::size_t i = hash & (slots_.size() - 1);
+        for (; slots_[i] != 0; i = (i + 1) & (slots_.size() - 1)) {
+            if (matches(slots_[i], hash, title)) return;
+        }
+        // Records are counted in 32 bits: a text holding 2^32 titles would not fit in memory.
+        records_.push_back({title, value});
+        slots_[i] = tagOf(hash) | records_.size();
+        if (records_.size() * 2 > slots_.size()) grow();
+    }
+
+    // The hash of a title, its slot fetched into the cache meanwhile, for find().
+    std::size_t prefetch(std::string_view title) const {
+        const std::size_t hash = Hash{}(title);
+        __builtin_prefetch(&slots_[hash & (slots_.size() - 1)]);
+        return hash;
+    }
+
+    // The value of `title`, whose hash is `hash`; nothing when it has none.
+    const Value* find(std::string_view title, std::size_t hash) const {
+        for (std::size_t i = hash & (slots_.size() - 1); slots_[i] != 0;
+             i = (i + 1) & (slots_.size() - 1)) {
+            if (matches(slots_[i], hash, title))
+                return &records_[(slots_[i] & 0xFFFFFFFFu) - 1].value;
+        }
+        return nullptr;
+    }
+
+  private:
+    struct Record {
+        std::string_view title;
+        Value value;
+    };
+
+    static std::uint64_t tagOf(std::size_t hash) {
+        return static_cast<std::uint64_t>(hash) >> 32 << 32;
+    }
+    bool matches(std::uint64_t slot, std::size_t hash, std::string_view title) const {
+        return (slot >> 32 << 32) == tagOf(hash) &&
+               Equal{}(records_[(slot & 0xFFFFFFFFu) - 1].title, title);
+    }
+
+    void grow() {
+        std::vector<std::uint64_t> old(slots_.size() * 2);
+        old.swap(slots_);
+        for (const std::uint64_t slot : old) {
+            if (slot == 0) continue;
+            const std::size_t hash = Hash{}(records_[(slot & 0xFFFFFFFFu) - 1].title);
+            std::size_t i = hash & (slots_.size() - 1);
+            while (slots_[i] != 0) i = (i + 1) & (slots_.size() - 1);
+            slots_[i] = slot;
+        }
+    }
+
+    std::vector<std::uint64_t> slots_;  // hash's high half, then record + 1; 0 when free
+    std::vector<Record> records_;
+};
+
 // Every title line of an entry text, looked up by its exact title; the first one wins, as a
-// search from the start of the text would find it. The other fields are found by the positions
-// of their markers, so a title costs a few binary searches however long the text is.
+// search from the start of the text would find it. The other fields follow from the first of
+// their markers after the title, which in a file the program wrote start the next lines.
 class EntryIndex {
   public:
     explicit EntryIndex(std::string_view text) : text_(text) {
-        // An entry takes at least twenty bytes; reserving for that many avoids rehashing.
-        titles_.reserve(text.size() / 20 + 1);
         for (std::size_t at = text.find(catalogue::kTitleTag); at != std::string_view::npos;
              at = text.find(catalogue::kTitleTag, at + 1)) {
             const std::size_t start = at + catalogue::kTitleTag.size();
             const std::size_t cr = text.find('\r', start);
             if (cr == std::string_view::npos) break;  // a title line needs its CR
-            titles_.emplace(text.substr(start, cr - start), at);
+            titles_.putFirst(text.substr(start, cr - start), at);
         }
-        collect(catalogue::kTypeTag, types_);
-        collect(catalogue::kDiscsTag, discs_);
-        collect(catalogue::kInfoTag, infos_);
     }
 
-    Fields find(std::string_view title) const {
-        const auto hit = titles_.find(title);
-        if (hit == titles_.end()) return {};
-        std::size_t from = hit->second;
+    // Starts looking for `title`: its hash, for find().
+    std::size_t prefetch(std::string_view title) const { return titles_.prefetch(title); }
+
+    Fields find(std::string_view title) const { return find(title, titles_.prefetch(title)); }
+    Fields find(std::string_view title, std::size_t hash) const {
+        const std::size_t* hit = titles_.find(title, hash);
+        if (hit == nullptr) return {};
+        std::size_t from = *hit + 1;  // past the title's own marker, which is none of the others
         Fields fields;
-        fields.type = fieldAfter(types_, from);
-        fields.discs = fieldAfter(discs_, from);
-        fields.information = fieldAfter(infos_, from);
+        fields.type = fieldAfter(catalogue::kTypeTag, 0, from);
+        fields.discs = fieldAfter(catalogue::kDiscsTag, 1, from);
+        fields.information = fieldAfter(catalogue::kInfoTag, 2, from);
         return fields;
     }
 
   private:
-    void collect(std::string_view tag, std::vector<std::size_t>& positions) const {
-        for (std::size_t at = text_.find(tag); at != std::string_view::npos;
-             at = text_.find(tag, at + 1)) {
-            positions.push_back(at);
+    // The text after the first `tag` at or after `from`, up to the next CR; `from` moves to that
+    // CR. Empty when no such marker follows.
+    std::string_view fieldAfter(std::string_view tag, std::size_t kind, std::size_t& from) const {
+        // Every marker starts with "<": when the first "<" from here starts this one, it is the
+        // first. Otherwise (a file written by hand) the marker's positions are searched.
+        std::size_t at = text_.find('<', from);
+        if (at == std::string_view::npos) return {};
+        if (text_.compare(at, tag.size(), tag) != 0) {
+            const std::vector<std::size_t>& positions = markers(kind, tag);
+            const auto next = std::lower_bound(positions.begin(), positions.end(), from);
+            if (next == positions.end()) return {};
+            at = *next;
         }
-    }
-
-    // The text after the first marker at or after `from`, up to the next CR; `from` moves to
-    // that CR. Empty when no marker follows.
-    std::string_view fieldAfter(const std::vector<std::size_t>& positions,
-                                std::size_t& from) const {
-        const auto at = std::lower_bound(positions.begin(), positions.end(), from);
-        if (at == positions.end()) return {};
-        const std::size_t start = *at + 3;
+        const std::size_t start = at + tag.size();
         std::size_t cr = text_.find('\r', start);
         if (cr == std::string_view::npos) cr = text_.size();
         from = cr;
         return text_.substr(start, cr - start);
     }
 
+    // Where every `tag` stands in the text, found on first need.
+    const std::vector<std::size_t>& markers(std::size_t kind, std::string_view tag) const {
+        std::optional<std::vector<std::size_t>>& positions = markers_[kind];
+        if (!positions) {
+            positions.emplace();
+            for (std::size_t at = text_.find(tag); at != std::string_view::npos;
+                 at = text_.find(tag, at + 1)) {
+                positions->push_back(at);
+            }
+        }
+        return *positions;
+    }
+
     std::string_view text_;
-    std::unordered_map<std::string_view, std::size_t> titles_;
-    std::vector<std::size_t> types_;
-    std::vector<std::size_t> discs_;
-    std::vector<std::size_t> infos_;
+    // Entries of a real list take some 60 bytes or more; the map grows should they be shorter.
+    FlatTitleMap<std::size_t, std::hash<std::string_view>, std::equal_to<>> titles_{
+        text_.size() / 60 + 1};
+    mutable std::array<std::optional<std::vector<std::size_t>>, 3> markers_;  // type, discs, info
 };
 
-// Hashing and comparing titles ignoring Latin-1 case, without building folded copies.
+// Latin-1 letter case folded by table.
+inline const std::array<std::uint8_t, 256> kFoldTable = [] {
+    std::array<std::uint8_t, 256> table{};
+    for (std::size_t c = 0; c < table.size(); ++c) {
+        table[c] = catalogue::foldByte(static_cast<unsigned char>(c));
+    }
+    return table;
+}();
+
+// Hashing and comparing titles ignoring Latin-1 case, without building folded copies. The hash
+// takes eight folded bytes at a time.
 struct FoldedHash {
     std::size_t operator()(std::string_view text) const {
-        std::size_t h = 14695981039346656037ull;
-        for (char c : text) {
-            h = (h ^ catalogue::foldByte(static_cast<unsigned char>(c))) * 1099511628211ull;
+        std::uint64_t h = 0x9E3779B97F4A7C15ull ^ text.size();
+        for (std::size_t at = 0; at < text.size(); at += 8) {
+            std::uint64_t word = 0;
+            const std::size_t n = std::min<std::size_t>(8, text.size() - at);
+            for (std::size_t b = 0; b < n; ++b) {
+                word |= std::uint64_t{kFoldTable[static_cast<unsigned char>(text[at + b])]}
+                        << (8 * b);
+            }
+            h = (h ^ word) * 0xFF51AFD7ED558CCDull;
+            h ^= h >> 32;
         }
-        return h;
+        return static_cast<std::size_t>(h);
     }
 };
 struct FoldedEqual {
@@ -101,8 +206,7 @@ struct FoldedEqual {
 // the catalogue would allow.
 class ArticleIndex {
   public:
-    explicit ArticleIndex(std::string_view text) {
-        numbers_.reserve(text.size() / 9 + 1);  // an article line takes at least nine bytes
+    explicit ArticleIndex(std::string_view text) : numbers_(text.size() / 30 + 1) {
         std::size_t start = 0;
         while (start < text.size()) {
             const auto [line, end] = catalogue::lineAt(text, start);
@@ -111,19 +215,26 @@ class ArticleIndex {
                  at = line.find(catalogue::kArticleSeparator, at + 1)) {
                 const std::size_t numberAt = at + catalogue::kArticleSeparator.size();
                 if (start + numberAt >= end) break;  // nothing at all follows the separator
-                numbers_.emplace(line.substr(0, at), line.substr(numberAt, 4));
+                numbers_.putFirst(line.substr(0, at), line.substr(numberAt, 4));
             }
             start = end;
         }
     }
 
+    // Starts looking for `title`: its hash, for find().
+    std::size_t prefetch(std::string_view title) const { return numbers_.prefetch(title); }
+
     std::string_view find(std::string_view title) const {
-        const auto hit = numbers_.find(title);
-        return hit == numbers_.end() ? std::string_view() : hit->second;
+        return find(title, numbers_.prefetch(title));
+    }
+    std::string_view find(std::string_view title, std::size_t hash) const {
+        const std::string_view* hit = numbers_.find(title, hash);
+        return hit == nullptr ? std::string_view() : *hit;
     }
 
   private:
-    std::unordered_map<std::string_view, std::string_view, FoldedHash, FoldedEqual> numbers_;
+    // Article lines of a real list take some 30 bytes; the map grows should they be shorter.
+    FlatTitleMap<std::string_view, FoldedHash, FoldedEqual> numbers_;
 };
 
 }  // namespace exporting

@@ -5,7 +5,9 @@
 #include <stdexcept>
 #include <string>
 
+#include "catalogue/list_import.h"
 #include "catalogue/records.h"
+#include "tests/support/temp_folder.h"
 
 namespace catalogue {
 namespace {
@@ -64,6 +66,23 @@ TEST(ArticleNumbers, UsedUpAndDamagedRecordsAreRefusedForTheirLetterOnly) {
         EXPECT_EQ(counterProblem(text, 'B'), CounterProblem::None);
     }
     EXPECT_EQ(counterProblem("A#001\r\n", '!'), CounterProblem::None);
+}
+
+// An import counts a letter's numbers on past its last one exactly as Adds one after another do.
+TEST(ArticleNumbers, AnImportHandsOutWhatAddsInARowWould) {
+    test_support::TempFolder folder;
+    folder.put("pemla.dat", "Rock\r\n");
+    folder.put("Rock.dat", "");
+    folder.put("Rock.arn", "A#998\r\nB#005\r\n");
+    Store store(folder.path());
+    const ImportResult r = importCsv(store, "Rock", "title\na1\nA2\nb\nA3\nZed\na4\n");
+    EXPECT_EQ(r.added, 4);
+    ASSERT_EQ(r.refused.size(), 2u);
+    EXPECT_EQ(r.refused[0].line, 5);
+    EXPECT_EQ(r.refused[1].reason, r.refused[0].reason);
+    EXPECT_NE(r.refused[0].reason.find("letter A (A001 to A999)"), std::string::npos);
+    EXPECT_EQ(folder.get("Rock.art"), "a1#*\\A998\r\nA2#*\\A999\r\nb#*\\B005\r\nZed#*\\Z001\r\n");
+    EXPECT_EQ(folder.get("Rock.arn"), "A#000\r\nB#006\r\nZ#002\r\n");
 }
 
 }  // namespace

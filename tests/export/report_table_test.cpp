@@ -87,6 +87,14 @@ TEST(ReportTable, EmptyTableMissingEntriesAndOversizedRows) {
     EXPECT_EQ(wide[3].substr(0, 54), "| " + std::string(50, 'T') + "| ");
 }
 
+// A hand-edited entry: other text with "<" before the type, information before the discs. Each
+// field is the first of its markers after the one before, and missing when none follows.
+TEST(ReportTable, FieldsOfAHandEditedEntryAreTheFirstMarkersThatFollow) {
+    const std::string entries = "<|?Odd\r\nnote <b>\r\n<|'LP\r\n<|*i\r\n<||2\r\n";
+    EXPECT_EQ(linesOf(BuildReportTable("M", entries, "", {"Odd"}, {false, true}, ""))[3],
+              "| Odd                        | LP                |   2    |                  |\r\n");
+}
+
 TEST(ReportTable, LargestListIsBuiltInLinearTime) {
     // 32767 titles, the article file reversed and in capitals, so that any search from the
     // start of a text per row would show at once (the sanitizers slow every access several
