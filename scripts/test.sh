@@ -28,9 +28,9 @@ echo "== Format =="
 echo "== Fuzz targets (a few seconds each) =="
 "$root/scripts/fuzz.sh" "${PEMLA_FUZZ_SECONDS:-5}" || status=1
 echo "== Tests (sanitizers) =="
-ctest --test-dir "$root/build-asan" --output-on-failure -j "$jobs" >"$root/build-asan/ctest.log" 2>&1 ||
+ctest --test-dir "$root/build-asan" --output-on-failure --timeout 300 -j "$jobs" >"$root/build-asan/ctest.log" 2>&1 ||
     status=1
 tail -n 25 "$root/build-asan/ctest.log"
 echo "== Tests =="
-ctest --test-dir "$root/build-test" --output-on-failure -j "$jobs" || status=1
+ctest --test-dir "$root/build-test" --output-on-failure --timeout 300 -j "$jobs" || status=1
 exit $status
