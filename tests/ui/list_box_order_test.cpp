@@ -42,4 +42,26 @@ TEST(QtListBoxOrder, OneTitleMovedEqualsARefill) {
     }
 }
 
+// A refill with too many changes to apply one by one rebuilds the rows, and a user's pick is a
+// click.
+TEST(QtListBoxOrder, ManyChangesRebuildTheRowsAndTheUserStillClicks) {
+    QListWidget rows;
+    ui::qt::QtListBox box(&rows);
+    int clicks = 0;
+    box.onClick = [&] { ++clicks; };
+    const auto userPicks = [&](int row) {
+        rows.clearSelection();
+        rows.item(row)->setSelected(true);
+    };
+    Strings many;
+    for (char c = 'a'; c <= 'z'; ++c) many.push_back(std::string(1, c));
+    box.setItems({"only"});
+    box.setItems(many);
+    ASSERT_EQ(rows.count(), 26);
+    EXPECT_EQ(rows.item(25)->text(), "z");
+    userPicks(3);
+    EXPECT_EQ(clicks, 1);
+    EXPECT_EQ(box.itemText(3), "d");
+}
+
 }  // namespace
