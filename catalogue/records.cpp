@@ -29,24 +29,28 @@ std::size_t lineEnd(std::string_view text, std::size_t at) {
     return lineAt(text, at).next;
 }
 
-// The span of an entry found at `at`: up to the next title line, or the end of the text.
-std::size_t entryEnd(std::string_view text, std::size_t at) {
-    const std::size_t next = text.find(kTitleTag, at + 1);
-    return next == npos ? text.size() : next;
+// Whether a line of the text starts at `at`: at the start, or right after a line end.
+bool startsLine(std::string_view text, std::size_t at) {
+    return at == 0 || text[at - 1] == '\r' ||
+           (text[at - 1] == '\n' && at >= 2 && text[at - 2] == '\r');
 }
 
-// Describes the entry span [at, end) of a file text (every line followed by CR LF).
-EntrySpan spanOf(std::string_view text, std::size_t at, std::size_t end) {
-    EntrySpan span{at, end, false};
-    const auto lineStart = [&](std::size_t pos) {
-        return pos == 0 || pos == text.size() || (pos >= 2 && text.substr(pos - 2, 2) == kCrLf);
-    };
-    if (!lineStart(at) || !lineStart(end)) return span;
-    const auto crs = [&](std::size_t from, std::size_t to) {
-        return std::count(text.begin() + static_cast<std::ptrdiff_t>(from),
-                          text.begin() + static_cast<std::ptrdiff_t>(to), '\r');
-    };
-    span.oneEntry = crs(at, end) == 4 && crs(0, at) % 4 == 0;
+// The entry whose title line starts at `at`: its four lines, or up to the end of a text that
+// stops short of them.
+EntrySpan spanOf(std::string_view text, std::size_t at) {
+    EntrySpan span{at, at, false};
+    int lines = 0;
+    while (lines < 4 && span.end < text.size()) {
+        const std::size_t cr = text.find('\r', span.end);
+        if (cr == npos) {
+            span.end = text.size();
+            break;
+        }
+        span.end = cr + 1;
+        if (span.end < text.size() && text[span.end] == '\n') ++span.end;
+        ++lines;
+    }
+    span.oneEntry = lines == 4;
     return span;
 }
 
@@ -81,7 +85,21 @@ std::size_t findTitleLine(std::string_view entries, std::string_view title) {
     std::string needle;
     needle.reserve(title.size() + 4);
     needle.append(kTitleTag).append(title).push_back('\r');
-    return findIgnoreCase(entries, needle);
+    // Only a line that starts one of the four-line entries is a title line: a value of a file
+    // from elsewhere may hold the title tag, and taking it for an entry would cut the file
+    // across entries. Lines are counted only when a match turns up.
+    std::size_t counted = 0;
+    std::size_t lines = 0;
+    for (std::size_t at = findIgnoreCase(entries, needle); at != npos;
+         at = findIgnoreCase(entries, needle, at + 1)) {
+        if (!startsLine(entries, at)) continue;
+        lines += static_cast<std::size_t>(
+            std::count(entries.begin() + static_cast<std::ptrdiff_t>(counted),
+                       entries.begin() + static_cast<std::ptrdiff_t>(at), '\r'));
+        counted = at;
+        if (lines % 4 == 0) return at;
+    }
+    return npos;
 }
 
 std::optional<Entry> findEntry(std::string_view entries, std::string_view title) {
@@ -122,8 +140,9 @@ std::optional<std::string> replaceEntry(std::string_view entries, std::string_vi
                                         const Entry& entry, EntrySpan* found) {
     const std::size_t at = findTitleLine(entries, oldTitle);
     if (at == npos) return std::nullopt;
-    const std::size_t end = entryEnd(entries, at);
-    if (found != nullptr) *found = spanOf(entries, at, end);
+    const EntrySpan span = spanOf(entries, at);
+    const std::size_t end = span.end;
+    if (found != nullptr) *found = span;
     std::string text;
     text.reserve(entries.size() + entry.title.size() + 64);
     text.append(entries.substr(0, at));
@@ -136,8 +155,9 @@ std::optional<std::string> removeEntry(std::string_view entries, std::string_vie
                                        EntrySpan* found) {
     const std::size_t at = findTitleLine(entries, title);
     if (at == npos) return std::nullopt;
-    const std::size_t end = entryEnd(entries, at);
-    if (found != nullptr) *found = spanOf(entries, at, end);
+    const EntrySpan span = spanOf(entries, at);
+    const std::size_t end = span.end;
+    if (found != nullptr) *found = span;
     std::string text;
     text.reserve(entries.size());
     text.append(entries.substr(0, at));

@@ -44,7 +44,8 @@ std::string flagFile(std::string_view list);
 // character on. Nothing when the file does not hold whole entries of four lines.
 std::optional<std::vector<std::string>> entryTitles(std::string_view bytes);
 
-// Position of the title line "<|?" + title + CR in an entry text, ignoring case; npos if none.
+// Position of the first title line "<|?" + title + CR in an entry text, ignoring case, that
+// starts one of its four-line entries; npos if none.
 std::size_t findTitleLine(std::string_view entries, std::string_view title);
 
 // The entry whose title line is the first "<|?" + title + CR (ignoring case); its other fields
@@ -57,14 +58,12 @@ std::string entryLines(const Entry& entry);
 // The entry text with the entry appended at its end.
 std::string appendEntry(std::string_view entries, const Entry& entry);
 
-// Where an edit found the entry it replaced or removed: from its title line up to the next
-// title marker or the end of the text.
+// Where an edit found the entry it replaced or removed: its title line and the three lines
+// after it, or up to the end of a text that stops short of them.
 struct EntrySpan {
     std::size_t at = 0;
     std::size_t end = 0;
-    // The span is exactly one entry's four lines, lined up with the entries counted from the
-    // start: the edit changed that one title and no other. A value holding a record marker (in
-    // a file from elsewhere) can make the span cut across entries instead.
+    // The span is the entry's four whole lines: the edit changed that one title and no other.
     bool oneEntry = false;
 };
 

@@ -279,10 +279,12 @@ TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
         EXPECT_EQ(result.stamp, store.stampOf("Rock.dat"));
         expectList("Rock", entryText(dat), articleText(art), crlf(kRockArn));
     }
-    // A value holding a title marker (a file from elsewhere) makes the cut cross entries: which
-    // titles are left is then not known without reading the list again.
-    folder.put("Rock.dat", entryText({{"Zebra", "CD", "1", "x<|?abc"}, kRock[2], kRock[3]}));
-    EXPECT_FALSE(deleteEntry(store, read("Rock"), "abc").removedTitle);
+    // A value holding a title marker (a file from elsewhere) is no entry: the entry goes whole.
+    const Entry zebra{"Zebra", "CD", "1", "x<|?abc"};
+    folder.put("Rock.dat", entryText({zebra, kRock[2], kRock[3]}));
+    ASSERT_EQ(kRock[2].title, "abc");
+    EXPECT_EQ(deleteEntry(store, read("Rock"), "abc").removedTitle, "abc");
+    EXPECT_EQ(folder.get("Rock.dat"), entryText({zebra, kRock[3]}));
     // Without an article file, the entry alone goes.
     putRock();
     folder.remove(("Rock.art"));

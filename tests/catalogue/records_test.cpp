@@ -68,6 +68,31 @@ TEST(Records, AppendReplaceAndRemoveKeepOtherEntries) {
     EXPECT_EQ(removeEntry(entriesOf({kWars, kStar, upper}), "star"), entriesOf({kWars, upper}));
 }
 
+// Older files could store the title tag inside a value. Only a line that starts one of the
+// four-line entries is a title line: finding, the duplicate test, replacing and removing never
+// take a tag inside a value (at a line's end or at the start of a type line) for an entry.
+TEST(Records, TitleTagsInsideValuesAreNoEntries) {
+    const Entry a{"A", "<|?B", "1", "see <|?B"};
+    const Entry b{"B", "CD", "2", "b"};
+    const Entry c{"C", "LP", "3", "<|?C"};
+    const std::string text = entriesOf({a, b, c});
+    EXPECT_EQ(found(text, "b"), entryLines(b));
+    EXPECT_EQ(found(text, "C"), entryLines(c));
+    EXPECT_EQ(findTitleLine(entriesOf({a}), "B"), std::string::npos);
+    EXPECT_EQ(findTitleLine(text, "C"), entriesOf({a, b}).size());
+    const Entry changed{"N", "x", "y", "z"};
+    EXPECT_EQ(replaceEntry(text, "A", changed), entriesOf({changed, b, c}));
+    EXPECT_EQ(replaceEntry(text, "B", changed), entriesOf({a, changed, c}));
+    EXPECT_EQ(removeEntry(text, "A"), entriesOf({b, c}));
+    EXPECT_EQ(removeEntry(text, "C"), entriesOf({a, b}));
+    EntrySpan span;
+    ASSERT_TRUE(removeEntry(text, "A", &span));
+    EXPECT_TRUE(span.oneEntry);
+    // A text that stops short of the entry's four lines: the rest goes, and it is not one entry.
+    EXPECT_EQ(removeEntry("<|?A\r\n<|'t\r\n", "A", &span), "");
+    EXPECT_FALSE(span.oneEntry);
+}
+
 // A title's article line is the one whose text before the separator is the title, never one
 // that merely begins or ends with it.
 TEST(Records, ArticleLines) {
