@@ -52,12 +52,6 @@ TEST_F(StoreTest, ReadsAndNamesTheFileAndReasonOfAFailedRead) {
     EXPECT_EQ(store.readTextIfExists("Rock.inf"), " 1 \r\n");
     EXPECT_EQ(store.readTextIfExists("Rock.top"), std::nullopt);
     EXPECT_TRUE(store.exists("Rock.dat") && !store.exists("Rock.top"));
-    // Larger than one read buffer, with bytes of every value.
-    std::string big;
-    for (int i = 0; i < 300000; ++i)
-        big.push_back(static_cast<char>(i % 251 == 13 ? 'x' : i % 251));
-    folder.put("big.dat", big);
-    EXPECT_EQ(store.readBytes("big.dat"), big);
 
     expectError([&] { store.readNumber("Missing.inf"); }, "Missing.inf", ENOENT);
     std::filesystem::create_directory(folder.file("Folder.dat"));

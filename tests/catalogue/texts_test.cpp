@@ -20,17 +20,14 @@ std::string lines(std::string_view bytes) {
     return out;
 }
 
+// A lone LF is data, only one LF after a CR belongs to the line end, and the end of the file ends
+// the last line; bytes pass unchanged.
 TEST(FileText, LineRuleEndsAtCrAndSkipsOneLf) {
-    EXPECT_EQ(lines(""), "");
-    EXPECT_EQ(lines("a\r\nb\r\n"), "a|b|");
-    EXPECT_EQ(lines("a\r\nb"), "a|b|");  // the end of the file ends the last line
-    EXPECT_EQ(lines("a\rb\r"), "a|b|");
-    EXPECT_EQ(lines("x\r\r\ny"), "x||y|");
-    EXPECT_EQ(lines("\r\n\r\n"), "||");
-    // A lone LF is data, and only one LF after a CR belongs to the line end.
-    EXPECT_EQ(lines("a\nb"), "a\nb|");
-    EXPECT_EQ(lines("a\r\n\nb"), "a|\nb|");
-    EXPECT_EQ(lines("\xE9t\xE9\r\n"), "\xE9t\xE9|");  // bytes pass unchanged
+    const std::pair<std::string, std::string> cases[] = {
+        {"", ""},           {"a\r\nb\r\n", "a|b|"}, {"a\r\nb", "a|b|"},
+        {"a\rb\r", "a|b|"}, {"x\r\r\ny", "x||y|"},  {"\r\n\r\n", "||"},
+        {"a\nb", "a\nb|"},  {"a\r\n\nb", "a|\nb|"}, {"\xE9t\xE9\r\n", "\xE9t\xE9|"}};
+    for (const auto& [bytes, split] : cases) EXPECT_EQ(lines(bytes), split) << bytes;
 }
 
 TEST(FileText, TextReadAndWrittenEndsEveryLineWithCrLf) {

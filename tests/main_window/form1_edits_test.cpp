@@ -19,7 +19,7 @@ TEST_F(Form1Test, AddShowsTheNewTitleAndEmptiesTheFieldsOrKeepsThemWithTheRefusa
     expectReset();
     EXPECT_TRUE(view.Text1.hasFocus());
     EXPECT_EQ(folder.get("Rock.dat"),
-              entryText(rock) + entryText({{"Blues", "Music CD", "2", "Copy"}}));
+              entryText(kRock) + entryText({{"Blues", "Music CD", "2", "Copy"}}));
     EXPECT_TRUE(platform.shown().empty());
 
     const Files before = files();
@@ -41,7 +41,7 @@ TEST_F(Form1Test, AddShowsTheNewTitleAndEmptiesTheFieldsOrKeepsThemWithTheRefusa
 
 // With no list open, "Add" says so, keeps what was typed and writes nothing.
 TEST_F(Form1Test, AddWithNoListOpenSaysSo) {
-    putRock();
+    putRock(folder);
     start();
     const Files before = files();
     fill({"Orphan", "CD", "1", ""});
@@ -154,8 +154,8 @@ TEST_F(Form1Test, AnEditedListEqualsAFullRefill) {
 }
 
 TEST_F(Form1Test, DeletingTheOnlyEntryShowsThePlaceholder) {
-    putList("Solo", entryText({{"Jazz Album", "CD", "2", "Copy"}}),
-            articleText({{"Jazz Album", "J001"}}), crlf({"J#002"}), " 0 \r\n");
+    folder.putList("Solo", entryText({{"Jazz Album", "CD", "2", "Copy"}}),
+                   articleText({{"Jazz Album", "J001"}}), crlf({"J#002"}), " 0 \r\n");
     folder.put("pemla.dat", "Solo\r\n");
     start();
     open("Solo");
@@ -169,7 +169,7 @@ TEST_F(Form1Test, DeletingTheOnlyEntryShowsThePlaceholder) {
 }
 
 TEST_F(Form1Test, DeleteListAsksTwiceAndShowsTheListsLeft) {
-    putRock({"Jazz"});
+    putRock(folder, {"Jazz"});
     start();
     const Files before = files();
     view.Command_delete.click();  // nothing selected: nothing asked

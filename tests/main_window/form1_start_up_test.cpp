@@ -33,11 +33,11 @@ TEST_F(Form1Test, StartUpFillsTheBoxesButNeverOffersASuggestionFilesFirstLine) {
 // An earlier build named a list's files with the Latin-1 bytes of its name. At the start they
 // take their UTF-8 names, bytes untouched, and the list works on as before.
 TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
-    putRock();
+    putRock(folder);
     const std::string latin1 = "B\xFChne", utf8 = "B\xC3\xBChne";
     folder.put("pemla.dat", crlf({"Rock", latin1}));
     for (const std::string ending : {".dat", ".art", ".arn", ".inf", ".top"})
-        folder.put(latin1 + ending, ending == ".dat"   ? entryText(rock)
+        folder.put(latin1 + ending, ending == ".dat"   ? entryText(kRock)
                                     : ending == ".inf" ? " 1 "
                                                        : ending);
     folder.put(utf8 + ".top", "newer");  // a file of the new name is never replaced
@@ -49,7 +49,7 @@ TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
     open(latin1);
     fill({"New", "CD", "1", "x"});
     view.Command_add.click();
-    EXPECT_EQ(folder.get(utf8 + ".dat"), entryText(rock) + entryText({{"New", "CD", "1", "x"}}));
+    EXPECT_EQ(folder.get(utf8 + ".dat"), entryText(kRock) + entryText({{"New", "CD", "1", "x"}}));
     EXPECT_TRUE(platform.shown().empty());
 }
 
@@ -57,7 +57,7 @@ TEST_F(Form1Test, FilesNamedByAnEarlierBuildAreRenamedAndKeptWhole) {
 TEST_F(Form1Test, DialogsOpenOnlyOnceAListIsSelectedAndOpen) {
     MemoryWindow newList, search, exporter;
     form->setDialogs({&newList, &exporter, &search});
-    putRock({"Empty"});
+    putRock(folder, {"Empty"});
     folder.put("Empty.dat", "");
     start();
     view.Command_search.click();
@@ -108,7 +108,7 @@ TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) 
 
 // A second copy on a held folder reads and finishes nothing, not even the first copy's journal.
 TEST_F(Form1Test, ASecondCopyNamesTheFolderAndEndsWithStatusThreeTouchingNothing) {
-    putRock();
+    putRock(folder);
     start();
     folder.put("pemla.journal", "the first copy's commit, under way");
     const Files before = files();

@@ -31,21 +31,6 @@ MainWindowFixture::MainWindowFixture()
     form->setDialogs({&newListView.window, &exportView.window, nullptr});
 }
 
-void MainWindowFixture::putList(const std::string& name, const std::string& entries,
-                                const std::string& articles, const std::string& counter,
-                                const std::string& flag) {
-    folder.put(name + ".dat", entries);
-    folder.put(name + ".art", articles);
-    folder.put(name + ".arn", counter);
-    if (!flag.empty()) folder.put(name + ".inf", flag);
-}
-
-void MainWindowFixture::putRock(const std::string& index) {
-    putList("Rock", entryText({{"Abba Gold", "Music CD", "1", "Original"}}),
-            articleText({{"Abba Gold", "A001"}}), "A#002\r\n");
-    folder.put("pemla.dat", index);
-}
-
 void MainWindowFixture::start() {
     view.window.show();
 }

@@ -50,12 +50,6 @@ struct MemoryForm1 {
 struct MainWindowFixture {
     MainWindowFixture();
 
-    // Writes a list's files: entry text, article text, counter text, and the flag (none when
-    // `flag` is empty).
-    void putList(const std::string& name, const std::string& entries, const std::string& articles,
-                 const std::string& counter = "A#001\r\n", const std::string& flag = " 1 \r\n");
-    // The list "Rock" holding "Abba Gold" (A001), and the index `index`.
-    void putRock(const std::string& index = "Rock\r\n");
     // Loads the main window (its start-up runs).
     void start();
     // The user selects a list, or a title of the open list; false (and a failure) when it is

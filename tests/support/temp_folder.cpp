@@ -33,6 +33,15 @@ void TempFolder::put(std::string_view name, std::string_view bytes) const {
     if (!out) throw std::runtime_error("cannot write test file " + std::string(name));
 }
 
+void TempFolder::putList(const std::string& name, const std::string& entries,
+                         const std::string& articles, const std::string& counter,
+                         const std::string& flag) const {
+    put(name + ".dat", entries);
+    put(name + ".art", articles);
+    put(name + ".arn", counter);
+    if (!flag.empty()) put(name + ".inf", flag);
+}
+
 std::string TempFolder::get(std::string_view name) const {
     std::ifstream in(file(name), std::ios::binary);
     if (!in) {
@@ -68,10 +77,28 @@ void putMusicCatalogue(const TempFolder& folder) {
     folder.put("type.dat", "Types\r\nMusic CD\r\nGame\r\n");
     folder.put("information.dat", "Information\r\nOriginal\r\n");
     folder.put("pemla.dat", "Music\r\n");
-    folder.put("Music.dat", "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n");
-    folder.put("Music.art", "Zebra#*\\Z001\r\n");
-    folder.put("Music.arn", "A#001\r\nZ#002\r\n");
-    folder.put("Music.inf", " 1 \r\n");
+    folder.putList("Music", "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n",
+                   "Zebra#*\\Z001\r\n", "A#001\r\nZ#002\r\n");
+}
+
+const std::vector<catalogue::Entry> kRock = {{"Zebra", "CD", "1", "Original"},
+                                             {"abcd", "DVD", "2", "Copy"},
+                                             {"abc", "Game", "3", ""},
+                                             {"xabc", "CD", "10", "x"},
+                                             {"1st", "LP", "1", "Original"}};
+const std::vector<std::pair<std::string, std::string>> kRockArticles = {
+    {"xabc", "X001"}, {"abcd", "A001"}, {"Zebra", "Z001"}, {"1st", "!001"}, {"abc", "A002"}};
+const std::vector<std::string> kRockCounter = {"A#003", "Z#002", "X#002", "!#002"};
+
+void putRock(const TempFolder& folder, const std::vector<std::string>& others) {
+    folder.putList("Rock", entryText(kRock), articleText(kRockArticles), crlf(kRockCounter));
+    std::vector<std::string> index = {"Rock"};
+    for (const std::string& other : others) {
+        folder.putList(other, std::string(catalogue::kSkeletonEntries),
+                       std::string(catalogue::kSkeletonArticles));
+        index.push_back(other);
+    }
+    folder.put("pemla.dat", crlf(index));
 }
 
 namespace fs = std::filesystem;
