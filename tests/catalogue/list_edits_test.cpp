@@ -61,10 +61,6 @@ TEST_F(ListEdits, AddAppendsTheEntryAndTheNextNumberOfItsFirstLetter) {
         const char* number;
         Lines counter;
     } cases[] = {
-        {"Rock",
-         {"Blues", "Music CD", "2", "Copy"},
-         "B001",
-         {"A#003", "Z#002", "X#002", "!#002", "B#002"}},
         {"Rock", {"ab", "CD", "1", ""}, "A003", {"A#004", "Z#002", "X#002", "!#002"}},
         {"Rock", {"abcde", "CD", "1", ""}, "A003", {"A#004", "Z#002", "X#002", "!#002"}},
         {"Rock", {"bc", "CD", "1", ""}, "B001", {"A#003", "Z#002", "X#002", "!#002", "B#002"}},
