@@ -49,7 +49,7 @@ void writeReport(Rig& r) {
 // An import as the command runs it, its failures shown as the command prints them.
 void importRows(Rig& r, const char* list) {
     r.form->guarded([&] {
-        const std::string rows = "title,type\r\nDylan,LP\r\nabc,dup\r\n\"Zappa, Frank\",CD\r\n";
+        const std::string rows = "title,type\r\nDylan,LP\r\nMiles,dup\r\n\"Zappa, Frank\",CD\r\n";
         const catalogue::ImportResult result = catalogue::importCsv(r.store, list, rows);
         if (!result.problem.empty()) r.platform.messageBox(result.problem, 16, "Error");
     });
@@ -75,7 +75,7 @@ const Operation kOperations[] = {
     {"SaveExportSettings", "Rock", nullptr, 0, {}, saveExportSettings},
     {"WriteReportAsText", "Rock", nullptr, 0, {Answer::Ok}, writeReport},
     {"WriteReportAsHtml", "Rock", nullptr, 1, {Answer::Ok}, writeReport},
-    {"ImportIntoAList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Rock"); }},
+    {"ImportIntoAList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Solo"); }},
     {"ImportIntoANewList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Blues"); }},
     {"RenameFilesOfAnEarlierBuild", nullptr, nullptr, -1, {}, restart, false, true},
 };
