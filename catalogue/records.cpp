@@ -131,7 +131,11 @@ std::string entryLines(const Entry& entry) {
 }
 
 std::string appendEntry(std::string_view entries, const Entry& entry) {
-    std::string text = forWriting(entries);
+    std::string text;
+    text.reserve(entries.size() + kCrLf.size() + entry.title.size() + entry.type.size() +
+                 entry.discs.size() + entry.information.size() + 20);
+    text.append(entries);
+    if (!text.empty() && !text.ends_with(kCrLf)) text.append(kCrLf);
     text.append(entryLines(entry));
     return text;
 }
