@@ -51,6 +51,23 @@ template <unsigned char... Stops>
     return size;
 }
 
+// How many bytes of text[from, to) are `byte`.
+template <unsigned char Byte>
+inline std::size_t countOf(std::string_view text, std::size_t from, std::size_t to) {
+    const char* const bytes = text.data();
+    std::size_t count = 0;
+#if defined(__SSE2__)
+    for (; from + 16 <= to; from += 16) {
+        const __m128i block = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + from));
+        const int hits =
+            _mm_movemask_epi8(_mm_cmpeq_epi8(block, _mm_set1_epi8(static_cast<char>(Byte))));
+        count += static_cast<std::size_t>(std::popcount(static_cast<unsigned>(hits)));
+    }
+#endif
+    for (; from < to; ++from) count += static_cast<unsigned char>(bytes[from]) == Byte ? 1 : 0;
+    return count;
+}
+
 // What a text holds of two kinds of byte: one of `Stops`, and one above 127.
 struct ByteKinds {
     bool stop = false;

@@ -48,6 +48,11 @@ bool isFileText(std::string_view bytes) {
 
 }  // namespace
 
+std::string toFileText(std::string&& bytes) {
+    if (isFileText(bytes)) return std::move(bytes);
+    return toFileText(std::string_view(bytes));
+}
+
 std::string toFileText(std::string_view bytes) {
     if (isFileText(bytes)) return std::string(bytes);
     std::string text;
