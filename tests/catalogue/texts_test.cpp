@@ -36,6 +36,10 @@ TEST(FileText, TextReadAndWrittenEndsEveryLineWithCrLf) {
     EXPECT_EQ(toFileText("a\r\n\r\n"), "a\r\n\r\n");
     EXPECT_EQ(toFileText("a\r\n\nb"), "a\r\n\nb\r\n");
     EXPECT_EQ(toFileText("\r"), "\r\n");
+    // A lone CR deep in a long text, and one just before the last CR LF.
+    const std::string x20(20, 'x');
+    EXPECT_EQ(toFileText(x20 + "\r" + x20 + "\r\n"), x20 + "\r\n" + x20 + "\r\n");
+    EXPECT_EQ(toFileText(x20 + x20 + "\r\r\n"), x20 + x20 + "\r\n\r\n");
     EXPECT_EQ(forWriting(""), "");
     EXPECT_EQ(forWriting("a"), "a\r\n");
     EXPECT_EQ(forWriting("a\r\nb"), "a\r\nb\r\n");

@@ -62,7 +62,7 @@ void MemoryListBox::clear() {
     selected_ = -1;
 }
 
-std::string MemoryListBox::itemText(int index) const {
+const std::string& MemoryListBox::itemText(int index) const {
     if (index < 0 || index >= count()) throw std::out_of_range("list box index");
     return items_[static_cast<std::size_t>(index)];
 }

@@ -73,7 +73,7 @@ class MemoryListBox : public ListBox, public Owned {
     void setItems(std::vector<std::string> items) override;
     void clear() override;
     int count() const override { return static_cast<int>(items_.size()); }
-    std::string itemText(int index) const override;
+    const std::string& itemText(int index) const override;
     int selectedIndex() const override { return selected_; }
     bool selected(int index) const override { return index == selected_; }
     void setSelected(int index, bool selected) override;
