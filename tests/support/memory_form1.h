@@ -50,6 +50,11 @@ struct MemoryForm1 {
 struct MainWindowFixture {
     MainWindowFixture();
 
+    // Writes a list's files into the catalogue folder (see TempFolder::putList).
+    void putList(const std::string& name, const std::string& entries, const std::string& articles,
+                 const std::string& counter = "A#001\r\n", const std::string& flag = " 1 \r\n") {
+        folder.putList(name, entries, articles, counter, flag);
+    }
     // Loads the main window (its start-up runs).
     void start();
     // The user selects a list, or a title of the open list; false (and a failure) when it is
