@@ -40,6 +40,10 @@ struct Damage {
     std::vector<std::string> otherLists = {};
 };
 
+void PrintTo(const Damage& d, std::ostream* out) {
+    *out << d.name;
+}
+
 // A commit that could only fail after its point of no return would leave a journal that no start
 // can finish: such a target is refused before anything is written.
 void deleteRock(Rig& r) {

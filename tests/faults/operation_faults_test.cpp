@@ -81,6 +81,10 @@ const Operation kOperations[] = {
 };
 // clang-format on
 
+void PrintTo(const Operation& op, std::ostream* out) {
+    *out << op.name;
+}
+
 // Rock has five entries, Jazz the skeleton, Solo one entry; the export settings name the
 // output folder, with every box clear but HTML when the operation asks.
 void setUp(Rig& r, const Operation& op) {
