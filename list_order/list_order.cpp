@@ -1,6 +1,7 @@
 #include "list_order/list_order.h"
 
 #include <algorithm>
+#include <array>
 #include <cstddef>
 #include <cstdint>
 
@@ -17,40 +18,54 @@ bool itemLess(std::string_view a, std::string_view b) {
     return a < b;
 }
 
+namespace {
+
+const std::array<unsigned char, 256> kFolded = [] {
+    std::array<unsigned char, 256> table{};
+    for (std::size_t c = 0; c < table.size(); ++c)
+        table[c] = foldByte(static_cast<unsigned char>(c));
+    return table;
+}();
+
+}  // namespace
+
 void sortItems(std::vector<std::string>& items) {
     // Every item folded once into one buffer; the sort then compares plain bytes, and mostly
-    // only the first eight of them, held next to the item's number.
+    // only the first sixteen of them, held next to the item's number.
     std::size_t total = 0;
     for (const auto& item : items) total += item.size();
-    std::string folded;
-    folded.reserve(total);
+    std::string folded(total, '\0');
     std::vector<std::size_t> starts(items.size() + 1);
+    char* to = folded.data();
     for (std::size_t i = 0; i < items.size(); ++i) {
-        starts[i] = folded.size();
-        for (char c : items[i])
-            folded.push_back(static_cast<char>(foldByte(static_cast<unsigned char>(c))));
+        starts[i] = static_cast<std::size_t>(to - folded.data());
+        for (const char c : items[i])
+            *to++ = static_cast<char>(kFolded[static_cast<unsigned char>(c)]);
     }
-    starts[items.size()] = folded.size();
+    starts[items.size()] = total;
     const auto key = [&](std::size_t i) {
         return std::string_view(folded).substr(starts[i], starts[i + 1] - starts[i]);
     };
     struct Head {
-        std::uint64_t bytes;  // the first eight folded bytes, the first one highest; zeros after
+        // The first sixteen folded bytes, the first one highest; zeros after the text.
+        std::uint64_t high, low;
         std::size_t item;
     };
     std::vector<Head> heads(items.size());
     for (std::size_t i = 0; i < items.size(); ++i) {
         const std::string_view k = key(i);
-        std::uint64_t bytes = 0;
-        for (std::size_t b = 0; b < 8; ++b) {
-            bytes = bytes << 8 | (b < k.size() ? static_cast<unsigned char>(k[b]) : 0u);
+        std::uint64_t part[2] = {0, 0};
+        for (std::size_t b = 0; b < 16; ++b) {
+            const unsigned byte = b < k.size() ? static_cast<unsigned char>(k[b]) : 0u;
+            part[b / 8] = part[b / 8] << 8 | byte;
         }
-        heads[i] = {bytes, i};
+        heads[i] = {part[0], part[1], i};
     }
     // Heads that differ order the items as their folded texts do (unsigned bytes, a shorter
     // prefix first); equal heads leave it to the whole texts, then to the items themselves.
     std::sort(heads.begin(), heads.end(), [&](const Head& a, const Head& b) {
-        if (a.bytes != b.bytes) return a.bytes < b.bytes;
+        if (a.high != b.high) return a.high < b.high;
+        if (a.low != b.low) return a.low < b.low;
         const int byFold = key(a.item).compare(key(b.item));
         if (byFold != 0) return byFold < 0;
         return items[a.item] < items[b.item];
