@@ -2,8 +2,10 @@
 
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 
 namespace list_order {
 
@@ -27,6 +29,25 @@ const std::array<unsigned char, 256> kFolded = [] {
     return table;
 }();
 
+// Bytes `from` to `from` + 7 of a folded text as one number, the first byte highest and zeros
+// past the text's end. Eight bytes are read from `from` on, past the end too: the caller keeps
+// them readable.
+std::uint64_t headPart(std::string_view text, std::size_t from) {
+    if (from >= text.size()) return 0;
+    const std::size_t length = std::min<std::size_t>(8, text.size() - from);
+    if constexpr (std::endian::native == std::endian::little) {
+        std::uint64_t word;
+        std::memcpy(&word, text.data() + from, 8);
+        if (length < 8) word &= ~std::uint64_t{0} >> (64 - 8 * length);
+        return __builtin_bswap64(word);
+    }
+    std::uint64_t word = 0;
+    for (std::size_t b = 0; b < 8; ++b) {
+        word = word << 8 | (b < length ? static_cast<unsigned char>(text[from + b]) : 0u);
+    }
+    return word;
+}
+
 }  // namespace
 
 void sortItems(std::vector<std::string>& items) {
@@ -34,7 +55,7 @@ void sortItems(std::vector<std::string>& items) {
     // only the first sixteen of them, held next to the item's number.
     std::size_t total = 0;
     for (const auto& item : items) total += item.size();
-    std::string folded(total, '\0');
+    std::string folded(total + 16, '\0');  // sixteen bytes spare: each head is read whole
     std::vector<std::size_t> starts(items.size() + 1);
     char* to = folded.data();
     for (std::size_t i = 0; i < items.size(); ++i) {
@@ -54,12 +75,7 @@ void sortItems(std::vector<std::string>& items) {
     std::vector<Head> heads(items.size());
     for (std::size_t i = 0; i < items.size(); ++i) {
         const std::string_view k = key(i);
-        std::uint64_t part[2] = {0, 0};
-        for (std::size_t b = 0; b < 16; ++b) {
-            const unsigned byte = b < k.size() ? static_cast<unsigned char>(k[b]) : 0u;
-            part[b / 8] = part[b / 8] << 8 | byte;
-        }
-        heads[i] = {part[0], part[1], i};
+        heads[i] = {headPart(k, 0), headPart(k, 8), i};
     }
     // Heads that differ order the items as their folded texts do (unsigned bytes, a shorter
     // prefix first); equal heads leave it to the whole texts, then to the items themselves.
