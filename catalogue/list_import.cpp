@@ -244,6 +244,7 @@ struct Filling {
         return text.data() + used;
     }
     static char* put(char* to, std::string_view piece) {
+        if (piece.empty()) return to;  // an empty field may have no bytes to point at
         std::memcpy(to, piece.data(), piece.size());
         return to + piece.size();
     }
