@@ -9,10 +9,6 @@
 
 namespace ui::memory {
 
-namespace {
-const TextBox* focused = nullptr;
-}  // namespace
-
 void MemoryWindow::show() {
     if (loaded_) {
         bringToFront();
@@ -57,16 +53,6 @@ void MemoryListBox::setItems(std::vector<std::string> items) {
     selected_ = -1;
 }
 
-void MemoryListBox::clear() {
-    items_.clear();
-    selected_ = -1;
-}
-
-std::string MemoryListBox::itemText(int index) const {
-    if (index < 0 || index >= count()) throw std::out_of_range("list box index");
-    return items_[static_cast<std::size_t>(index)];
-}
-
 void MemoryListBox::setSelected(int index, bool selected) {
     if (index < 0 || index >= count()) throw std::out_of_range("list box index");
     if (selected) {
@@ -86,13 +72,7 @@ bool MemoryListBox::userSelect(int index) {
 
 bool MemoryListBox::userSelect(const std::string& text) {
     const auto at = std::find(items_.begin(), items_.end(), text);
-    if (at == items_.end()) return false;
-    return userSelect(static_cast<int>(at - items_.begin()));
-}
-
-std::string MemoryComboBox::itemText(int index) const {
-    if (index < 0 || index >= itemCount()) throw std::out_of_range("combo box index");
-    return items_[static_cast<std::size_t>(index)];
+    return at != items_.end() && userSelect(static_cast<int>(at - items_.begin()));
 }
 
 bool MemoryComboBox::setText(const std::string& text) {
@@ -122,17 +102,7 @@ void MemoryComboBox::type(const std::string& keys) {
 
 bool MemoryComboBox::userPick(int index) {
     if (!acceptsInput() || index < 0 || index >= itemCount()) return false;
-    text_ = items_[static_cast<std::size_t>(index)];
-    allSelected_ = false;
-    return true;
-}
-
-void MemoryTextBox::setFocus() {
-    focused = this;
-}
-
-bool MemoryTextBox::hasFocus() const {
-    return focused == this;
+    return setText(items_[static_cast<std::size_t>(index)]);
 }
 
 void MemoryTextBox::type(const std::string& keys) {
@@ -152,8 +122,9 @@ bool MemoryCheckBox::userToggle() {
     return true;
 }
 
-MemoryDriveList::MemoryDriveList(std::vector<std::string> drives) : drives_(std::move(drives)) {
-    if (!drives_.empty()) drive_ = drives_.front();
+void MemoryDriveList::offer(std::vector<std::string> drives) {
+    drives_ = std::move(drives);
+    drive_ = drives_.empty() ? std::string() : drives_.front();
 }
 
 bool MemoryDriveList::setDrive(const std::string& drive) {
@@ -178,8 +149,8 @@ bool MemoryDirList::setPath(const std::string& path) {
 Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const std::string& title) {
     shown_.push_back({prompt, title, style});
     // A box under the busy pointer looks as if the program were still working.
-    if (busyDepth_ > 0) throw MessageBoxWhileBusy{prompt};
-    if (answers_.empty()) throw UnscriptedMessageBox{prompt, title, style};
+    if (busyDepth_ > 0) throw MessageBoxWhileBusy{shown_.back()};
+    if (answers_.empty()) throw UnscriptedMessageBox{shown_.back()};
     const Answer next = answers_.front();
     answers_.pop_front();
     return next;
