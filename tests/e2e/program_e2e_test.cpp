@@ -134,7 +134,6 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     EXPECT_EQ(main.List1->count(), 0);
 
     expectFolder(work.path(), "end", reports);
-    expectFolder(reports, "out");
     EXPECT_EQ(boxes.take(), Shown{});
 }
 

@@ -23,6 +23,12 @@ class Owned {
     bool ownEnabled_ = true;
 };
 
+// Puts each control on `window`.
+template <class... Controls>
+void own(const Window& window, Controls&... controls) {
+    (controls.setOwner(&window), ...);
+}
+
 // The state every kind of control keeps alike: its caption and whether it is enabled. Where the
 // interface of `Base` declares these, they implement it.
 template <class Base>
