@@ -3,9 +3,11 @@
 // compared byte for byte with files written out by hand.
 #include <gtest/gtest.h>
 
+#include <QFileSystemModel>
 #include <QListWidget>
 #include <QPushButton>
 #include <QTest>
+#include <QTreeView>
 #include <cstdlib>
 #include <filesystem>
 
@@ -100,7 +102,8 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     app::ExportView& exporter = program.exportDialog();
     ASSERT_TRUE(exporter.widget()->isVisible());
     EXPECT_EQ(exporter.controls().Dir1.path(), home.path());
-    pickFolder(exporter.Dir1, reports);
+    auto* folders = static_cast<QFileSystemModel*>(exporter.Dir1->model());
+    exporter.Dir1->setCurrentIndex(folders->index(QString::fromStdString(reports)));
     ASSERT_EQ(exporter.controls().Dir1.path(), reports);
     for (QCheckBox* box :
          {exporter.Checkart, exporter.Checkline, exporter.Checkcounter, exporter.Check_lastadd}) {
