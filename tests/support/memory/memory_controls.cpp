@@ -10,10 +10,7 @@
 namespace ui::memory {
 
 void MemoryWindow::show() {
-    if (loaded_) {
-        bringToFront();
-        return;
-    }
+    if (loaded_) return bringToFront();
     loaded_ = true;
     if (onLoad) onLoad();
 }
@@ -55,11 +52,7 @@ void MemoryListBox::setItems(std::vector<std::string> items) {
 
 void MemoryListBox::setSelected(int index, bool selected) {
     if (index < 0 || index >= count()) throw std::out_of_range("list box index");
-    if (selected) {
-        selected_ = index;
-    } else if (selected_ == index) {
-        selected_ = -1;
-    }
+    if (selected || selected_ == index) selected_ = selected ? index : -1;
 }
 
 bool MemoryListBox::userSelect(int index) {
@@ -88,15 +81,13 @@ void MemoryComboBox::type(const std::string& keys) {
         int key = c;
         if (onKeyPress) onKeyPress(key);
         if (key == 0) continue;
+        // A key typed over the selected text replaces it; a backspace only removes it.
         if (std::exchange(allSelected_, false)) {
             text_.clear();
-            if (key == 8) continue;
+        } else if (key == 8 && !text_.empty()) {
+            text_.pop_back();
         }
-        if (key == 8) {
-            if (!text_.empty()) text_.pop_back();
-        } else {
-            text_.push_back(static_cast<char>(key));
-        }
+        if (key != 8) text_.push_back(static_cast<char>(key));
     }
 }
 
@@ -108,11 +99,9 @@ bool MemoryComboBox::userPick(int index) {
 void MemoryTextBox::type(const std::string& keys) {
     if (!acceptsInput()) return;
     for (char c : keys) {
-        if (c == '\b') {
-            if (!text_.empty()) text_.pop_back();
-        } else if (maxLength_ <= 0 || static_cast<int>(text_.size()) < maxLength_) {
-            text_.push_back(c);
-        }
+        const bool fits = maxLength_ <= 0 || static_cast<int>(text_.size()) < maxLength_;
+        if (c == '\b' && !text_.empty()) text_.pop_back();
+        if (c != '\b' && fits) text_.push_back(c);
     }
 }
 
@@ -137,12 +126,10 @@ bool MemoryDriveList::setDrive(const std::string& drive) {
 
 bool MemoryDirList::setPath(const std::string& path) {
     std::error_code ec;
-    if (path.empty() || !std::filesystem::is_directory(path, ec)) return false;
     std::filesystem::directory_iterator probe(path, ec);
     if (ec) return false;
-    std::string clean = path;
-    while (clean.size() > 1 && clean.ends_with('/')) clean.pop_back();
-    path_ = clean;
+    path_ = path;
+    while (path_.size() > 1 && path_.ends_with('/')) path_.pop_back();
     return true;
 }
 
@@ -159,11 +146,6 @@ Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const st
 void MemoryPlatform::beginBusy() {
     ++busyDepth_;
     ++busyCount_;
-}
-
-void MemoryPlatform::endProgram(int status) {
-    ended_ = true;
-    endStatus_ = status;
 }
 
 }  // namespace ui::memory

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <deque>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -191,14 +192,14 @@ class MemoryPlatform : public Platform {
     std::string shortDate() override { return "06.12.2026"; }
     void beginBusy() override;
     void endBusy() override { --busyDepth_; }
-    void endProgram(int status) override;
+    void endProgram(int status) override { ended_ = status; }
 
     const std::vector<Shown>& shown() const { return shown_; }
     int beeps() const { return beeps_; }
     int busyDepth() const { return busyDepth_; }
     int busyCount() const { return busyCount_; }
-    bool ended() const { return ended_; }
-    int endStatus() const { return endStatus_; }
+    bool ended() const { return ended_.has_value(); }
+    int endStatus() const { return ended_.value_or(0); }
 
   private:
     std::deque<Answer> answers_;
@@ -206,8 +207,7 @@ class MemoryPlatform : public Platform {
     int beeps_ = 0;
     int busyDepth_ = 0;
     int busyCount_ = 0;
-    bool ended_ = false;
-    int endStatus_ = 0;
+    std::optional<int> ended_;  // the status the program ended with
 };
 
 }  // namespace ui::memory
