@@ -9,11 +9,8 @@
 #include <QTest>
 #include <iostream>
 
-#include "app/main_window_view.h"
+#include "app/program.h"
 #include "bench/catalogue_maker.h"
-#include "catalogue/store.h"
-#include "main_window/form1.h"
-#include "main_window/title_finder.h"
 #include "tests/e2e/qt_user.h"
 #include "tests/support/temp_folder.h"
 #include "ui/qt/qt_platform.h"
@@ -23,15 +20,15 @@ namespace {
 using qt_user::click;
 using qt_user::pick;
 
+// The program on a folder, its main window shown.
 struct QtMainWindow {
     explicit QtMainWindow(const test_support::TempFolder& folder)
-        : store(folder.path()), form(view.controls(), platform, store) {
-        view.controls().window.show();
+        : program(folder.path(), platform), view(program.mainWindow()) {
+        program.start();
     }
-    catalogue::Store store;
     ui::qt::QtPlatform platform;
-    app::MainWindowView view;
-    main_window::Form1 form;
+    app::Program program;
+    app::MainWindowView& view;
 };
 
 // The real program started a second time on the folder this window holds ends with its message
@@ -98,8 +95,6 @@ TEST(MainWindowOnQt, TheLargestListOpensAndFindsQuickly) {
 
     // The "Find title" box: a key searches every row (each title holds a space); F3 and
     // Shift+F3 step and wrap.
-    main_window::TitleFinder finder(w.form);
-    w.view.connectFinder(finder);
     w.view.widget()->activateWindow();
     ASSERT_TRUE(QTest::qWaitForWindowActive(w.view.widget()));
     timer.restart();
