@@ -3,6 +3,10 @@
 #include <climits>
 #include <string>
 
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
+
 namespace catalogue {
 
 std::vector<std::string_view> splitLines(std::string_view bytes) {
@@ -15,7 +19,42 @@ std::vector<std::string_view> splitLines(std::string_view bytes) {
     return lines;
 }
 
+namespace {
+
+// Whether the bytes are a file text already: every CR followed by LF, and CR LF at the end. A file
+// the program wrote always is, so it is taken whole rather than line by line.
+bool isFileText(std::string_view bytes) {
+    if (bytes.empty()) return true;
+    if (!bytes.ends_with(kCrLf)) return false;
+    const char* const data = bytes.data();
+    const std::size_t size = bytes.size();
+    std::size_t at = 0;
+#if defined(__SSE2__)
+    // Sixteen bytes at a time: the CRs of a block, and the LFs one byte further on.
+    for (; at + 17 <= size; at += 16) {
+        const __m128i here = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + at));
+        const __m128i next = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + at + 1));
+        const int crs = _mm_movemask_epi8(_mm_cmpeq_epi8(here, _mm_set1_epi8('\r')));
+        const int lfs = _mm_movemask_epi8(_mm_cmpeq_epi8(next, _mm_set1_epi8('\n')));
+        if ((crs & ~lfs) != 0) return false;
+    }
+#endif
+    // The last byte is LF, so every CR has a byte after it.
+    for (; at < size; ++at) {
+        if (data[at] == '\r' && data[at + 1] != '\n') return false;
+    }
+    return true;
+}
+
+}  // namespace
+
+std::string toFileText(std::string&& bytes) {
+    if (isFileText(bytes)) return std::move(bytes);
+    return toFileText(std::string_view(bytes));
+}
+
 std::string toFileText(std::string_view bytes) {
+    if (isFileText(bytes)) return std::string(bytes);
     std::string text;
     text.reserve(bytes.size() + 2);
     for (std::size_t start = 0; start < bytes.size();) {

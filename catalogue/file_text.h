@@ -35,6 +35,11 @@ std::vector<std::string_view> splitLines(std::string_view bytes);
 // The file text of some file bytes: every line followed by CR LF. For a file the program wrote,
 // this is byte for byte the file itself.
 std::string toFileText(std::string_view bytes);
+// The same, taking over bytes that are a file text already instead of copying them.
+std::string toFileText(std::string&& bytes);
+inline std::string toFileText(const char* bytes) {
+    return toFileText(std::string_view(bytes));
+}
 
 // The bytes to store for a text: unchanged when it ends with CR LF, otherwise followed by one
 // CR LF. The empty text stays empty.

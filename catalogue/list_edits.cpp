@@ -71,18 +71,19 @@ EditResult addEntry(Store& store, const OpenList& list, const Entry& entry) {
     EditResult result;
     Transaction t = store.begin();
     t.expect(entryFile(list.name), list.stamp);
-    result.entries = appendEntry(list.entries, entry);
-    t.write(entryFile(list.name), result.entries);
+    t.write(entryFile(list.name), appendEntry(list.entries, entry));
     std::string words;
     std::optional<std::string> number = planArticleNumber(t, list.name, entry.title[0], words);
     if (!number) return refused(Refused::NumbersUsedUp, std::move(words));
     result.articleNumber = std::move(*number);
     const std::string articles = articleFile(list.name);
-    std::string text = forWriting(t.readTextIfExists(articles).value_or(""));
+    // A file text ends with its line end already.
+    std::string text = t.readTextIfExists(articles).value_or("");
     text += articleLine(entry.title, result.articleNumber);
-    t.write(articles, text);
+    t.write(articles, std::move(text));
     t.commit();
     result.stamp = t.written(entryFile(list.name));
+    result.entries = t.takeWritten(entryFile(list.name));
     result.addedTitle = entry.title;
     return result;
 }
@@ -117,19 +118,19 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
             result.articleNumber = std::move(*number);
             std::string moved = removeArticleLine(articles, oldTitle);
             moved += articleLine(entry.title, result.articleNumber);
-            t.write(articleName, moved);
+            t.write(articleName, std::move(moved));
         } else {
             t.write(articleName, *renameArticleLine(articles, oldTitle, entry.title));
         }
     }
-    t.write(entryFile(list.name), *newText);
+    t.write(entryFile(list.name), std::move(*newText));
     t.commit();
     result.stamp = t.written(entryFile(list.name));
     if (found.oneEntry) {
         result.removedTitle = titleAt(list.entries, found, oldTitle);
         result.addedTitle = entry.title;
     }
-    result.entries = std::move(*newText);
+    result.entries = t.takeWritten(entryFile(list.name));
     return result;
 }
 
@@ -149,7 +150,7 @@ EditResult deleteEntry(Store& store, const OpenList& list, const std::string& ti
     EntrySpan found;
     std::optional<std::string> newText = removeEntry(list.entries, title, &found);
     if (!newText) throw missingEntry(list, title);
-    t.write(entryFile(list.name), *newText);
+    t.write(entryFile(list.name), std::move(*newText));
     const std::string articleName = articleFile(list.name);
     if (auto articles = t.readTextIfExists(articleName)) {
         t.write(articleName, removeArticleLine(*articles, title));
@@ -157,7 +158,7 @@ EditResult deleteEntry(Store& store, const OpenList& list, const std::string& ti
     t.commit();
     result.stamp = t.written(entryFile(list.name));
     if (found.oneEntry) result.removedTitle = titleAt(list.entries, found, title);
-    result.entries = std::move(*newText);
+    result.entries = t.takeWritten(entryFile(list.name));
     return result;
 }
 

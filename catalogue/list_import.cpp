@@ -1,9 +1,9 @@
 #include "catalogue/list_import.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdint>
 #include <cstring>
-#include <functional>
 #include <optional>
 
 #include "catalogue/byte_scan.h"
@@ -69,13 +69,16 @@ class TitleSet {
     void look(std::string_view title) {
         if (slots_.empty()) rehash(1024);
         const std::size_t used = starts_.back();
-        keys_.resize(used + title.size());
+        // Bytes past the last title are spare room for the next.
+        if (keys_.size() < used + title.size() + 8) {
+            keys_.resize(std::max(keys_.size() * 2, used + title.size() + 4096));
+        }
         char* const key = keys_.data() + used;
         for (std::size_t i = 0; i < title.size(); ++i) {
             key[i] = kFolded[static_cast<unsigned char>(title[i])];
         }
         length_ = title.size();
-        tag_ = static_cast<std::uint32_t>(std::hash<std::string_view>{}({key, length_}));
+        tag_ = hashOf(key, length_);
         __builtin_prefetch(&slots_[tag_ & (slots_.size() - 1)]);
     }
 
@@ -107,6 +110,25 @@ class TitleSet {
     }
 
   private:
+    // Mixes a folded title in eight bytes at a time. The eight bytes after the title must be
+    // readable: look() keeps them spare.
+    static std::uint32_t hashOf(const char* key, std::size_t length) {
+        std::uint64_t h = 0x9E3779B97F4A7C15u ^ length;
+        std::size_t i = 0;
+        for (; i + 8 <= length; i += 8) {
+            std::uint64_t word;
+            std::memcpy(&word, key + i, 8);
+            h = (h ^ word) * 0xBF58476D1CE4E5B9u;
+            h ^= h >> 29;
+        }
+        std::uint64_t last;
+        std::memcpy(&last, key + i, 8);
+        const std::size_t rest = length - i;  // 0 to 7 bytes of the title, the rest spare
+        last = rest == 0 ? 0 : last & (~std::uint64_t{0} >> (64 - 8 * rest));
+        h = (h ^ last) * 0x94D049BB133111EBu;
+        return static_cast<std::uint32_t>(h ^ h >> 32);
+    }
+
     void rehash(std::size_t size) {
         std::vector<std::uint64_t> old(size);
         old.swap(slots_);
@@ -119,7 +141,7 @@ class TitleSet {
         }
     }
 
-    std::string keys_;  // the folded titles one after another, then the one looked for
+    std::string keys_;  // the folded titles one after another, the one looked for, spare room
     std::vector<std::size_t> starts_ = {0};  // where each title starts in keys_, and the end
     std::vector<std::uint64_t> slots_;       // hash << 32 | title + 1; 0 when free
     std::size_t slot_ = 0, length_ = 0;      // the title last looked for
@@ -203,20 +225,42 @@ class Counters {
     std::array<Letter, 27> letters_;  // A to Z, then "!"
 };
 
-// Whether Add might refuse a row's entry: no title, or the row holds a line break or the start of
-// a record marker or of the article separator somewhere. Most rows hold none of it, and those
-// that do are left to entryRefusal() to judge.
-bool mayBeRefused(std::string_view row, std::string_view title) {
-    return title.empty() || findAnyOf<'\r', '\n', '<', '#'>(row) != row.size();
+// What one look at a row's bytes tells: `stop` when the row holds a line break or the start of a
+// record marker or of the article separator somewhere, so that Add might refuse its entry (most
+// rows hold none of it, and those that do are left to entryRefusal() to judge); `high` when it
+// holds a byte above 127, so that it reads differently as UTF-8 and as Latin-1.
+ByteKinds rowKinds(std::string_view row) {
+    return byteKinds<'\r', '\n', '<', '#'>(row);
 }
+
+// A text filled from its front: room for a row is made once, and its pieces are then copied in
+// without the checks of one append each. The bytes past `used` are spare.
+struct Filling {
+    std::string text;
+    std::size_t used = 0;
+
+    char* room(std::size_t bytes) {
+        if (text.size() < used + bytes) text.resize(std::max(text.size() * 2, used + bytes));
+        return text.data() + used;
+    }
+    static char* put(char* to, std::string_view piece) {
+        std::memcpy(to, piece.data(), piece.size());
+        return to + piece.size();
+    }
+    std::string done() && {
+        text.resize(used);
+        return std::move(text);
+    }
+};
 
 // The list's texts as they grow row by row, and what the Add button's tests need.
 struct Growing {
     // Takes in the titles of the list's entry text; false when it does not hold whole entries.
     bool takeTitles() {
+        const std::string_view text(entries.text);
         std::size_t lines = 0;
-        for (std::size_t at = 0; at < entries.size(); ++lines) {
-            const Line line = lineAt(entries, at);
+        for (std::size_t at = 0; at < text.size(); ++lines) {
+            const Line line = lineAt(text, at);
             if (lines % 4 == 0) {
                 titles.look(line.text.substr(std::min<std::size_t>(3, line.text.size())));
                 if (!titles.holds()) titles.add();
@@ -228,47 +272,51 @@ struct Growing {
     }
 
     // Adds the entry of one record; why not when it cannot be added. The entry's lines are
-    // written straight into `entries`, and taken back should the row be refused.
+    // written straight into `entries`, and count only once the row is taken in.
     std::string addRow(const CsvReader& record) {
         if (record.unclosedQuote()) return "A quoted field is not closed before the file ends.";
         static constexpr std::array<std::string_view, 4> kLineStarts = {"<|?", "\r\n<|'", "\r\n<||",
                                                                         "\r\n<|*"};
-        const std::size_t mark = entries.size();
-        // A row without a byte above 127 reads the same as UTF-8 and as Latin-1.
-        const bool decode = utf8 && !isAscii(record.raw());
-        std::array<std::size_t, 4> start{}, length{};
-        for (std::size_t k = 0; k < kLineStarts.size(); ++k) {
-            std::string_view raw;
+        const ByteKinds kinds = rowKinds(record.raw());
+        const bool decode = utf8 && kinds.high;
+        std::array<std::string_view, 4> fields;
+        std::size_t bytes = 20;  // the line starts and the last line end
+        for (std::size_t k = 0; k < fields.size(); ++k) {
             if (column[k] && *column[k] < record.fields().size()) {
-                raw = record.fields()[*column[k]];
+                fields[k] = record.fields()[*column[k]];
             }
-            entries.append(kLineStarts[k]);
-            start[k] = entries.size();
-            char32_t outside = 0;
-            if (!decode) {
-                entries.append(raw);
-            } else if (!appendAsLatin1(entries, raw, &outside)) {
-                entries.resize(mark);
-                return std::string("The ") + kFieldNames[k] + " holds the character " +
-                       codePoint(outside) +
-                       ", which the list's files cannot store (they hold Latin-1 only).";
-            }
-            length[k] = entries.size() - start[k];
-            if (k == 0) titles.look(std::string_view(entries).substr(start[0], length[0]));
+            bytes += fields[k].size();  // decoding from UTF-8 only ever shortens a field
         }
-        entries.append(kCrLf);
+        char* const out = entries.room(bytes);
+        char* to = out;
         std::array<std::string_view, 4> values;
-        for (std::size_t k = 0; k < values.size(); ++k) {
-            values[k] = std::string_view(entries).substr(start[k], length[k]);
+        for (std::size_t k = 0; k < kLineStarts.size(); ++k) {
+            std::string_view raw = fields[k];
+            to = Filling::put(to, kLineStarts[k]);
+            if (decode) {
+                char32_t outside = 0;
+                decoded_.clear();
+                if (!appendAsLatin1(decoded_, raw, &outside)) {
+                    return std::string("The ") + kFieldNames[k] + " holds the character " +
+                           codePoint(outside) +
+                           ", which the list's files cannot store (they hold Latin-1 only).";
+                }
+                raw = decoded_;
+            }
+            values[k] = {to, raw.size()};
+            to = Filling::put(to, raw);
+            if (k == 0) titles.look(values[0]);
         }
-        std::string refusal = takeIn(record.raw(), values);
-        if (!refusal.empty()) entries.resize(mark);
+        to = Filling::put(to, kCrLf);
+        std::string refusal = takeIn(kinds.stop || values[0].empty(), values);
+        if (refusal.empty()) entries.used += static_cast<std::size_t>(to - out);
         return refusal;
     }
 
-    // Numbers and counts an entry whose lines are written; why Add refuses it instead.
-    std::string takeIn(std::string_view row, const std::array<std::string_view, 4>& values) {
-        if (mayBeRefused(row, values[0])) {
+    // Numbers and counts an entry whose lines are written; why Add refuses it instead. The
+    // entry checks run only when the row may hold something they refuse.
+    std::string takeIn(bool mayBeRefused, const std::array<std::string_view, 4>& values) {
+        if (mayBeRefused) {
             std::string refusal = entryRefusal({std::string(values[0]), std::string(values[1]),
                                                 std::string(values[2]), std::string(values[3])});
             if (!refusal.empty()) return refusal;
@@ -279,7 +327,12 @@ struct Growing {
         char number[4];
         std::string refusal;
         if (!counters.handOut(title.front(), number, refusal)) return refusal;
-        articles.append(title).append(kArticleSeparator).append(number, 4).append(kCrLf);
+        char* to = articles.room(title.size() + kArticleSeparator.size() + 4 + kCrLf.size());
+        to = Filling::put(to, title);
+        to = Filling::put(to, kArticleSeparator);
+        to = Filling::put(to, {number, 4});
+        to = Filling::put(to, kCrLf);
+        articles.used = static_cast<std::size_t>(to - articles.text.data());
         titles.add();
         ++count;
         return {};
@@ -287,10 +340,13 @@ struct Growing {
 
     std::array<std::optional<std::size_t>, 4> column;  // title, type, discs, information
     bool utf8 = false;
-    std::string entries, articles;
+    Filling entries, articles;
     Counters counters;
     TitleSet titles;
     std::size_t count = 0;
+
+  private:
+    std::string decoded_;  // a field of a UTF-8 row in Latin-1
 };
 
 }  // namespace
@@ -321,12 +377,14 @@ ImportResult importCsv(Store& store, const std::string& list, std::string_view c
     g.column = column;
     if (std::optional<std::string> name = listedName(index, list)) {
         result.list = *name;
-        g.entries = toFileText(store.readBytes(entryFile(result.list)));
+        g.entries.text = toFileText(store.readBytes(entryFile(result.list)));
+        g.entries.used = g.entries.text.size();
         if (!g.takeTitles()) {
             throw CatalogueError(entryFile(result.list), "the file ends inside an entry");
         }
         g.counters = Counters(store.readText(counterFile(result.list)), counterFile(result.list));
-        g.articles = forWriting(store.readTextIfExists(articleFile(result.list)).value_or(""));
+        g.articles.text = store.readTextIfExists(articleFile(result.list)).value_or("");
+        g.articles.used = g.articles.text.size();
     } else {
         const NewListCheck check = checkNewListName(store, list);
         const std::string refusal = list.size() > static_cast<std::size_t>(kMaxNameLength)
@@ -344,8 +402,8 @@ ImportResult importCsv(Store& store, const std::string& list, std::string_view c
 
     // A row's lines take its fields and about twenty bytes more; rows are rarely shorter than 40.
     g.titles.reserve(std::min(g.count + csvBytes.size() / 16, std::size_t{kMaxEntries}));
-    g.entries.reserve(g.entries.size() + csvBytes.size() + csvBytes.size() / 2);
-    g.articles.reserve(g.articles.size() + csvBytes.size() / 2);
+    g.entries.room(csvBytes.size() + csvBytes.size() / 2);
+    g.articles.room(csvBytes.size() / 2);
     while (reader.next()) {
         std::string refusal = g.addRow(reader);
         if (refusal.empty()) {
@@ -364,8 +422,8 @@ ImportResult importCsv(Store& store, const std::string& list, std::string_view c
         t.write(kIndexFile, forWriting(index) + list + "\r\n");
         t.write(flagFile(list), fileNumber(1));
     }
-    t.write(entryFile(result.list), g.entries);
-    t.write(articleFile(result.list), g.articles);
+    t.write(entryFile(result.list), std::move(g.entries).done());
+    t.write(articleFile(result.list), std::move(g.articles).done());
     t.write(counterFile(result.list), g.counters.text());
     t.commit();
     return result;

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "catalogue/byte_scan.h"
 #include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
@@ -93,9 +94,7 @@ std::size_t findTitleLine(std::string_view entries, std::string_view title) {
     for (std::size_t at = findIgnoreCase(entries, needle); at != npos;
          at = findIgnoreCase(entries, needle, at + 1)) {
         if (!startsLine(entries, at)) continue;
-        lines += static_cast<std::size_t>(
-            std::count(entries.begin() + static_cast<std::ptrdiff_t>(counted),
-                       entries.begin() + static_cast<std::ptrdiff_t>(at), '\r'));
+        lines += countOf<'\r'>(entries, counted, at);
         counted = at;
         if (lines % 4 == 0) return at;
     }
@@ -131,7 +130,11 @@ std::string entryLines(const Entry& entry) {
 }
 
 std::string appendEntry(std::string_view entries, const Entry& entry) {
-    std::string text = forWriting(entries);
+    std::string text;
+    text.reserve(entries.size() + kCrLf.size() + entry.title.size() + entry.type.size() +
+                 entry.discs.size() + entry.information.size() + 20);
+    text.append(entries);
+    if (!text.empty() && !text.ends_with(kCrLf)) text.append(kCrLf);
     text.append(entryLines(entry));
     return text;
 }
@@ -211,8 +214,11 @@ std::optional<std::string> renameArticleLine(std::string_view articles, std::str
 std::string removeArticleLine(std::string_view articles, std::string_view title) {
     const std::size_t at = findArticleLine(articles, title);
     if (at == npos) return std::string(articles);
-    std::string text(articles.substr(0, at));
-    text.append(articles.substr(lineEnd(articles, at)));
+    const std::size_t end = lineEnd(articles, at);
+    std::string text;
+    text.reserve(articles.size() - (end - at));
+    text.append(articles.substr(0, at));
+    text.append(articles.substr(end));
     return text;
 }
 

@@ -62,8 +62,11 @@ class Transaction {
     // Records that the operation is computed from `name` as it was when `stamp` was taken.
     void expect(const std::string& name, const FileStamp& stamp);
 
-    // Plans `name` to hold `text`, ending with exactly one CR LF after its last line.
+    // Plans `name` to hold `text`, ending with exactly one CR LF after its last line. The second
+    // form takes the text over instead of copying it; takeWritten() hands it back.
     void write(const std::string& name, std::string_view text);
+    void write(const std::string& name, std::string&& text);
+    void write(const std::string& name, const char* text) { write(name, std::string_view(text)); }
     // Plans `name` to be deleted; a file that does not exist is no error.
     void remove(const std::string& name);
     // Plans the file `from` to be renamed to `to`, its bytes untouched.
@@ -77,6 +80,9 @@ class Transaction {
     // After commit(): the stamp of a file it wrote, as the file stands in place; a file it did
     // not write has no stamp (exists is false).
     FileStamp written(const std::string& name) const;
+    // After commit(): the bytes it wrote to `name`, moved out of the transaction; empty for a
+    // file it did not write.
+    std::string takeWritten(const std::string& name);
 
   private:
     enum class Kind { Write, Remove, Rename };
@@ -87,6 +93,7 @@ class Transaction {
     };
     Store& store_;
     std::vector<Action> actions_;
+    std::vector<Action> committed_;
     std::vector<std::pair<std::string, FileStamp>> expected_;
     std::vector<std::pair<std::string, FileStamp>> written_;
 };

@@ -39,6 +39,11 @@ void Transaction::write(const std::string& name, std::string_view text) {
     actions_.push_back({name, Kind::Write, forWriting(text)});
 }
 
+void Transaction::write(const std::string& name, std::string&& text) {
+    if (!text.empty() && !text.ends_with(kCrLf)) text.append(kCrLf);
+    actions_.push_back({name, Kind::Write, std::move(text)});
+}
+
 void Transaction::remove(const std::string& name) {
     actions_.push_back({name, Kind::Remove, {}});
 }
@@ -55,10 +60,18 @@ FileStamp Transaction::written(const std::string& name) const {
     return {};
 }
 
+std::string Transaction::takeWritten(const std::string& name) {
+    for (Action& action : committed_) {
+        if (action.name == name && action.kind == Kind::Write) return std::move(action.bytes);
+    }
+    return {};
+}
+
 void Transaction::commit() {
     if (actions_.empty()) return;
     // The last plan for a name decides; earlier ones for it are dropped.
-    std::vector<Action> plan;
+    std::vector<Action>& plan = committed_;
+    plan.clear();
     std::set<std::string> seen;
     for (auto it = actions_.rbegin(); it != actions_.rend(); ++it) {
         if (seen.insert(it->name).second) plan.push_back(std::move(*it));

@@ -144,7 +144,8 @@ void Form_Export::SaveSettings() {
 
 std::string Form_Export::BuildReport(const std::string& list) {
     const ui::ListBox& titlesBox = main_.titles();
-    std::vector<std::string> titles;
+    // Views of the box's own items: the box does not change while the report is built.
+    std::vector<std::string_view> titles;
     titles.reserve(static_cast<std::size_t>(titlesBox.count()));
     for (int i = 0; i < titlesBox.count(); ++i) titles.push_back(titlesBox.itemText(i));
 

@@ -22,9 +22,8 @@ std::vector<std::string> listTitles(catalogue::Store& store, const std::string& 
     return std::move(*titles);
 }
 
-ListReport buildListReport(catalogue::Store& store, const std::string& list,
-                           const std::vector<std::string>& titles, const ReportChoices& choices,
-                           std::string_view date) {
+ListReport buildListReport(catalogue::Store& store, const std::string& list, TitleList titles,
+                           const ReportChoices& choices, std::string_view date) {
     ListReport result;
     // Lists made by older copies may have no flag file; the main window shows them with the
     // information column, and so does the report.

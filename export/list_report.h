@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "catalogue/store.h"
+#include "export/report_table.h"
 
 // A list's report built from its files, apart from any window: what the export dialog writes,
 // and what the command line writes with the same choices.
@@ -39,9 +40,8 @@ std::vector<std::string> listTitles(catalogue::Store& store, const std::string& 
 // line. A flag of 1 gives the information column and 0 takes it away, whatever the choice says.
 // `date` is shown when the date is chosen. Throws CatalogueError when a list file is missing or
 // unreadable (the top text excepted).
-ListReport buildListReport(catalogue::Store& store, const std::string& list,
-                           const std::vector<std::string>& titles, const ReportChoices& choices,
-                           std::string_view date);
+ListReport buildListReport(catalogue::Store& store, const std::string& list, TitleList titles,
+                           const ReportChoices& choices, std::string_view date);
 
 // The bytes of the report file: the HTML page, or the text followed by one more CR LF.
 std::string reportFileBytes(const std::string& list, std::string report, bool html);

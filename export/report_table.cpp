@@ -183,8 +183,8 @@ std::string BuildReportTable(std::string_view listName, std::string_view entryTe
 }
 
 void appendReportTable(std::string& out, std::string_view listName, std::string_view entryText,
-                       std::string_view articleText, const std::vector<std::string>& titles,
-                       const ReportOptions& options, std::string_view dateText) {
+                       std::string_view articleText, TitleList titles, const ReportOptions& options,
+                       std::string_view dateText) {
     const Layout& layout = layoutFor(options);
     const EntryIndex entries(entryText);
     const ArticleIndex articles(options.articleNumbers ? articleText : std::string_view());

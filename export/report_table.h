@@ -17,6 +17,27 @@ struct ReportOptions {
     bool counter = false;         // Checkcounter: the number of titles in the bottom line
 };
 
+// The titles of a report in their order, held as strings or as views into what holds them. It
+// only points at them: what holds them must outlive it.
+class TitleList {
+  public:
+    TitleList() = default;
+    TitleList(const std::vector<std::string>& titles)  // NOLINT: converts as the titles it shows
+        : strings_(titles.data()), size_(titles.size()) {}
+    TitleList(const std::vector<std::string_view>& titles)  // NOLINT
+        : views_(titles.data()), size_(titles.size()) {}
+
+    std::size_t size() const { return size_; }
+    std::string_view operator[](std::size_t i) const {
+        return strings_ != nullptr ? std::string_view(strings_[i]) : views_[i];
+    }
+
+  private:
+    const std::string* strings_ = nullptr;
+    const std::string_view* views_ = nullptr;
+    std::size_t size_ = 0;
+};
+
 // Builds the table for `titles` (the main window's List1, in its order). Each title's type, discs
 // and information come from its entry in `entryText` (exact title match), its article number from
 // `articleText` (matched ignoring case); both texts are indexed once, so the work is linear. A
@@ -27,8 +48,8 @@ std::string BuildReportTable(std::string_view listName, std::string_view entryTe
 
 // The same table appended to `out`, so that a report is written into one buffer.
 void appendReportTable(std::string& out, std::string_view listName, std::string_view entryText,
-                       std::string_view articleText, const std::vector<std::string>& titles,
-                       const ReportOptions& options, std::string_view dateText);
+                       std::string_view articleText, TitleList titles, const ReportOptions& options,
+                       std::string_view dateText);
 
 // About how many bytes the table of `titles` rows takes.
 std::size_t reportTableSize(std::size_t titles, const ReportOptions& options);

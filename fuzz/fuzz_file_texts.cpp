@@ -7,6 +7,9 @@
 void fuzzOne(const std::string& bytes) {
     const std::string text = catalogue::toFileText(bytes);
     check(text.empty() || text.ends_with("\r\n"));
+    for (std::size_t cr = text.find('\r'); cr != std::string::npos; cr = text.find('\r', cr + 1)) {
+        check(text[cr + 1] == '\n');
+    }
     check(catalogue::toFileText(text) == text);  // reading what we wrote changes nothing
     check(catalogue::forWriting(text) == text);
     const auto lines = catalogue::splitLines(bytes);

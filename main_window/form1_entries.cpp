@@ -35,7 +35,7 @@ void Form1::LoadEntries(const std::string& name) {
     c_.Label2.setCaption(kNoAmount);
 
     const std::string entryFile = catalogue::entryFile(name);
-    const std::string bytes = store_.readBytes(entryFile, &listStamp_);
+    std::string bytes = store_.readBytes(entryFile, &listStamp_);
 
     const bool information = HasInformation(name);
     c_.Text1.setMaxLength(information ? 26 : 42);
@@ -48,7 +48,7 @@ void Form1::LoadEntries(const std::string& name) {
                                             std::to_string(catalogue::splitLines(bytes).size()) +
                                             " lines, which is not four lines per entry)");
     }
-    ListText = catalogue::toFileText(bytes);
+    ListText = catalogue::toFileText(std::move(bytes));
     EntryCount = static_cast<int>(titles->size());
     c_.List1.setItems(std::move(*titles));
     c_.Label2.setCaption("... amount: " + catalogue::labelNumber(EntryCount) + " ...");

@@ -61,7 +61,8 @@ class ListBox {
     virtual void setItems(std::vector<std::string> items) = 0;
     virtual void clear() = 0;
     virtual int count() const = 0;
-    virtual std::string itemText(int index) const = 0;
+    // The item's text, as the box holds it until it changes.
+    virtual const std::string& itemText(int index) const = 0;
     // The selected item's index, or -1 when none is selected.
     virtual int selectedIndex() const = 0;
     virtual bool selected(int index) const = 0;

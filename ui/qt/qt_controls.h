@@ -97,7 +97,7 @@ class QtListBox : public ListBox {
     void setItems(std::vector<std::string> items) override;
     void clear() override;
     int count() const override { return static_cast<int>(items_.size()); }
-    std::string itemText(int index) const override;
+    const std::string& itemText(int index) const override;
     int selectedIndex() const override;
     bool selected(int index) const override;
     void setSelected(int index, bool selected) override;

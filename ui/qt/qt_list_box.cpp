@@ -100,7 +100,7 @@ void QtListBox::clear() {
     byCode_ = false;
 }
 
-std::string QtListBox::itemText(int index) const {
+const std::string& QtListBox::itemText(int index) const {
     return items_.at(static_cast<std::size_t>(index));
 }
 

@@ -75,7 +75,7 @@ class MemoryListBox : public Control<ListBox> {
     void setItems(std::vector<std::string> items) override;
     void clear() override { setItems({}); }
     int count() const override { return static_cast<int>(items_.size()); }
-    std::string itemText(int index) const override { return items_.at(index); }
+    const std::string& itemText(int index) const override { return items_.at(index); }
     int selectedIndex() const override { return selected_; }
     bool selected(int index) const override { return index == selected_; }
     void setSelected(int index, bool selected) override;
