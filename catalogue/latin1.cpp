@@ -16,7 +16,9 @@ struct FoldEqual {
 }  // namespace
 
 bool equalsIgnoreCase(std::string_view a, std::string_view b) {
-    return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin(), FoldEqual{});
+    if (a.size() != b.size()) return false;
+    // Texts compared ignoring case are mostly spelt alike: the plain comparison settles those.
+    return a == b || std::equal(a.begin(), a.end(), b.begin(), FoldEqual{});
 }
 
 std::size_t findIgnoreCase(std::string_view hay, std::string_view needle, std::size_t from) {

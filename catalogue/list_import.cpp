@@ -244,6 +244,7 @@ struct Filling {
         return text.data() + used;
     }
     static char* put(char* to, std::string_view piece) {
+        if (piece.empty()) return to;  // an empty field may have no bytes to point at
         std::memcpy(to, piece.data(), piece.size());
         return to + piece.size();
     }
@@ -277,19 +278,21 @@ struct Growing {
         if (record.unclosedQuote()) return "A quoted field is not closed before the file ends.";
         static constexpr std::array<std::string_view, 4> kLineStarts = {"<|?", "\r\n<|'", "\r\n<||",
                                                                         "\r\n<|*"};
-        const std::string_view row = record.raw();
-        const ByteKinds kinds = rowKinds(row);
+        const ByteKinds kinds = rowKinds(record.raw());
         const bool decode = utf8 && kinds.high;
-        // The fields are parts of the row, unquoting and decoding only shorten them, and the
-        // line starts and the last line end take twenty bytes.
-        char* const out = entries.room(row.size() + 20);
+        std::array<std::string_view, 4> fields;
+        std::size_t bytes = 20;  // the line starts and the last line end
+        for (std::size_t k = 0; k < fields.size(); ++k) {
+            if (column[k] && *column[k] < record.fields().size()) {
+                fields[k] = record.fields()[*column[k]];
+            }
+            bytes += fields[k].size();  // decoding from UTF-8 only ever shortens a field
+        }
+        char* const out = entries.room(bytes);
         char* to = out;
         std::array<std::string_view, 4> values;
         for (std::size_t k = 0; k < kLineStarts.size(); ++k) {
-            std::string_view raw;
-            if (column[k] && *column[k] < record.fields().size()) {
-                raw = record.fields()[*column[k]];
-            }
+            std::string_view raw = fields[k];
             to = Filling::put(to, kLineStarts[k]);
             if (decode) {
                 char32_t outside = 0;

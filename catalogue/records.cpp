@@ -71,14 +71,17 @@ std::string flagFile(std::string_view list) {
 }
 
 std::optional<std::vector<std::string>> entryTitles(std::string_view bytes) {
-    const std::vector<std::string_view> lines = splitLines(bytes);
-    if (lines.size() % 4 != 0) return std::nullopt;
     std::vector<std::string> titles;
-    titles.reserve(lines.size() / 4);
-    for (std::size_t i = 0; i < lines.size(); i += 4) {
-        const std::string_view first = lines[i];
-        titles.emplace_back(first.size() > 3 ? first.substr(3) : std::string_view());
+    titles.reserve(bytes.size() / 64 + 1);  // entries of a real list take some 60 bytes or more
+    std::size_t lines = 0;
+    for (std::size_t at = 0; at < bytes.size(); ++lines) {
+        const Line line = lineAt(bytes, at);
+        if (lines % 4 == 0) {
+            titles.emplace_back(line.text.size() > 3 ? line.text.substr(3) : std::string_view());
+        }
+        at = line.next;
     }
+    if (lines % 4 != 0) return std::nullopt;
     return titles;
 }
 

@@ -178,16 +178,26 @@ inline const std::array<std::uint8_t, 256> kFoldTable = [] {
 }();
 
 // Hashing and comparing titles ignoring Latin-1 case, without building folded copies. The hash
-// takes eight folded bytes at a time.
+// takes eight folded bytes at a time; eight ASCII bytes are folded at once.
 struct FoldedHash {
     std::size_t operator()(std::string_view text) const {
+        constexpr std::uint64_t kEach = 0x0101010101010101ull;
         std::uint64_t h = 0x9E3779B97F4A7C15ull ^ text.size();
         for (std::size_t at = 0; at < text.size(); at += 8) {
             std::uint64_t word = 0;
             const std::size_t n = std::min<std::size_t>(8, text.size() - at);
-            for (std::size_t b = 0; b < n; ++b) {
-                word |= std::uint64_t{kFoldTable[static_cast<unsigned char>(text[at + b])]}
-                        << (8 * b);
+            if (n == 8) std::memcpy(&word, text.data() + at, 8);
+            if (n == 8 && (word & kEach * 0x80) == 0) {
+                // Bytes below 128 add without carrying into their neighbours: "A" and above
+                // reach the high bit with 0x3F added, and above "Z" already with 0x25.
+                const std::uint64_t capitals = (word + kEach * 0x3F) & ~(word + kEach * 0x25);
+                word |= (capitals & kEach * 0x80) >> 2;
+            } else {
+                word = 0;
+                for (std::size_t b = 0; b < n; ++b) {
+                    word |= std::uint64_t{kFoldTable[static_cast<unsigned char>(text[at + b])]}
+                            << (8 * b);
+                }
             }
             h = (h ^ word) * 0xFF51AFD7ED558CCDull;
             h ^= h >> 32;

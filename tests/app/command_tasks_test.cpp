@@ -242,8 +242,8 @@ TEST(CommandExport, WritesWhatTheExportDialogWrites) {
         f.main.folder.put("Movies.top", "Top text\r\n");
         const auto saved = [&](bool on) {
             const char* box = on ? "1" : "0";
-            f.main.folder.put("export.dat", export_test::settings({f.out.path(), box, box, "1", "0",
-                                                                   "1", "1", "3", "Bottom"}));
+            f.main.folder.put("export.dat", test_support::crlf({f.out.path(), box, box, "1", "0",
+                                                                "1", "1", "3", "Bottom"}));
         };
         saved(html);
         f.openDialog();

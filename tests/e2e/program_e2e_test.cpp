@@ -3,14 +3,13 @@
 // compared byte for byte with files written out by hand.
 #include <gtest/gtest.h>
 
+#include <QFileSystemModel>
 #include <QListWidget>
 #include <QPushButton>
 #include <QTest>
+#include <QTreeView>
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
-#include <iterator>
-#include <map>
 
 #include "app/program.h"
 #include "tests/e2e/qt_user.h"
@@ -23,37 +22,22 @@ namespace fs = std::filesystem;
 
 const std::string kData = PEMLA_E2E_DATA;
 
-std::string readBytes(const fs::path& file) {
-    std::ifstream in(file, std::ios::binary);
-    return {std::istreambuf_iterator<char>(in), {}};
-}
-
-// Every regular file of a folder by name, with its bytes.
-std::map<std::string, std::string> filesOf(const fs::path& folder) {
-    std::map<std::string, std::string> files;
-    for (const auto& item : fs::directory_iterator(folder)) {
-        files[item.path().filename().string()] =
-            item.is_regular_file() ? readBytes(item.path()) : "(not a regular file)";
-    }
-    return files;
-}
-
 // Compares `folder` with the expected folder: the same file names and the same bytes. In
 // export.dat the token @OUTPUT@ stands for the output folder, which only the test knows.
-void expectFolder(const fs::path& folder, const std::string& expectedFolder,
+void expectFolder(const std::string& folder, const std::string& expectedFolder,
                   const std::string& output = {}) {
-    std::map<std::string, std::string> expected = filesOf(kData + "/" + expectedFolder);
+    test_support::Files expected = test_support::snapshot(kData + "/" + expectedFolder);
     if (auto settings = expected.find("export.dat"); settings != expected.end()) {
         settings->second.replace(settings->second.find("@OUTPUT@"), 8, output);
     }
-    EXPECT_EQ(filesOf(folder), expected) << expectedFolder;
+    EXPECT_EQ(test_support::snapshot(folder), expected) << expectedFolder;
 }
 
 TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     test_support::TempFolder work;
     test_support::TempFolder home;
     ::setenv("HOME", home.path().c_str(), 1);  // the export dialog's first output folder
-    const fs::path reports = fs::path(home.path()) / "reports";
+    const std::string reports = home.file("reports");
     fs::create_directory(reports);
     fs::copy(kData + "/start", work.path());
 
@@ -118,8 +102,9 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     app::ExportView& exporter = program.exportDialog();
     ASSERT_TRUE(exporter.widget()->isVisible());
     EXPECT_EQ(exporter.controls().Dir1.path(), home.path());
-    pickFolder(exporter.Dir1, reports.string());
-    ASSERT_EQ(exporter.controls().Dir1.path(), reports.string());
+    auto* folders = static_cast<QFileSystemModel*>(exporter.Dir1->model());
+    exporter.Dir1->setCurrentIndex(folders->index(QString::fromStdString(reports)));
+    ASSERT_EQ(exporter.controls().Dir1.path(), reports);
     for (QCheckBox* box :
          {exporter.Checkart, exporter.Checkline, exporter.Checkcounter, exporter.Check_lastadd}) {
         click(box);
@@ -140,7 +125,7 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     click(exporter.Command2);
     ASSERT_TRUE(main.widget()->isEnabled());
 
-    expectFolder(work.path(), "before-delete", reports.string());
+    expectFolder(work.path(), "before-delete", reports);
     expectFolder(reports, "out");
 
     // The list goes, after two confirmations; the other list stays as it was.
@@ -151,8 +136,7 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     ASSERT_EQ(main.List_list->count(), 1);
     EXPECT_EQ(main.List1->count(), 0);
 
-    expectFolder(work.path(), "end", reports.string());
-    expectFolder(reports, "out");
+    expectFolder(work.path(), "end", reports);
     EXPECT_EQ(boxes.take(), Shown{});
 }
 

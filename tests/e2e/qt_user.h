@@ -6,13 +6,11 @@
 #include <QAbstractButton>
 #include <QCheckBox>
 #include <QComboBox>
-#include <QFileSystemModel>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
-#include <QTreeView>
 #include <string>
 #include <utility>
 #include <vector>
@@ -68,22 +66,6 @@ inline void retype(QWidget* field, const char* latin1) {
         QTest::sendKeyEvent(QTest::Press, line, key, QString(c), Qt::NoModifier);
         QTest::sendKeyEvent(QTest::Release, line, key, QString(c), Qt::NoModifier);
     }
-}
-
-// Clicks a folder shown in a folder list, once the list has read it from disk.
-inline void pickFolder(QTreeView* tree, const std::string& path) {
-    auto* model = static_cast<QFileSystemModel*>(tree->model());
-    QModelIndex index;
-    const bool shown = QTest::qWaitFor(
-        [&] {
-            index = model->index(QString::fromStdString(path));
-            if (!index.isValid()) return false;
-            tree->scrollTo(index);
-            return !tree->visualRect(index).isEmpty();
-        },
-        10000);
-    ASSERT_TRUE(shown) << path << " never shown in the folder list";
-    QTest::mouseClick(tree->viewport(), Qt::LeftButton, {}, tree->visualRect(index).center());
 }
 
 }  // namespace qt_user

@@ -14,31 +14,9 @@ std::string data(const std::string& name) {
     return {std::istreambuf_iterator<char>(in), {}};
 }
 
-std::vector<std::string> movieTitles(bool withCasablanca) {
-    std::vector<std::string> titles = {"Alien",
-                                       "amelie",
-                                       "Blade Runner",
-                                       "Heat",
-                                       "Star",
-                                       "Star Wars",
-                                       "The Lord of the Rings Trilogy",
-                                       "Wars",
-                                       "Zorro"};
-    if (withCasablanca) titles.insert(titles.begin() + 3, "Casablanca");
-    return titles;
-}
-
-std::string settings(const std::vector<std::string>& lines) {
-    std::string text;
-    for (const std::string& line : lines) text += line + "\r\n";
-    return text;
-}
-
-ExportFixture::ExportFixture(std::vector<std::string> drives)
-    : dialog(std::move(drives)), form(dialog.controls(), main.platform, main.store, *main.form) {
+ExportFixture::ExportFixture() {
     if (const char* old = std::getenv("HOME")) oldHome_ = old;
     ::setenv("HOME", home.path().c_str(), 1);
-    main.form->setDialogs({nullptr, &dialog.window, nullptr});
 }
 
 ExportFixture::~ExportFixture() {

@@ -3,8 +3,6 @@
 #include <string>
 #include <vector>
 
-#include "export/form_export.h"
-#include "tests/support/memory_dialogs.h"
 #include "tests/support/memory_form1.h"
 #include "tests/support/temp_folder.h"
 
@@ -15,16 +13,9 @@ namespace export_test {
 // The bytes of a file of tests/data/export.
 std::string data(const std::string& name);
 
-// The titles of the "Movies" test list in the order List1 shows them, all ten or without
-// "Casablanca".
-std::vector<std::string> movieTitles(bool withCasablanca = true);
-
-// Settings file text from its lines.
-std::string settings(const std::vector<std::string>& lines);
-
 class ExportFixture {
   public:
-    explicit ExportFixture(std::vector<std::string> drives = {"/"});
+    ExportFixture();
     ~ExportFixture();
 
     // Puts the list "Movies" of tests/data with this flag file, starts the main window and
@@ -34,10 +25,9 @@ class ExportFixture {
     void openDialog();
 
     test_support::TempFolder home;
-    test_support::TempFolder out;
     test_support::MainWindowFixture main;
-    test_support::MemoryFormExport dialog;
-    exporting::Form_Export form;
+    test_support::MemoryFormExport& dialog = main.exportView;
+    const test_support::TempFolder& out = main.out;
 
   private:
     std::string oldHome_;

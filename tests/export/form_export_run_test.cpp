@@ -17,8 +17,8 @@ using ui::Answer;
 struct OpenMovies : export_test::ExportFixture {
     explicit OpenMovies(const std::string& flag = " 0 \r\n") {
         openMovies(flag);
-        main.folder.put("export.dat", export_test::settings({out.path(), "0", "0", "0", "0", "0",
-                                                             "0", "10", "Bottom"}));
+        main.folder.put("export.dat", test_support::crlf({out.path(), "0", "0", "0", "0", "0", "0",
+                                                          "10", "Bottom"}));
         openDialog();
     }
     // Presses "Export", answering `boxes` boxes with OK; the boxes shown as "title style: text".
@@ -101,7 +101,7 @@ TEST(ExportRun, TooManyLastAddedAreRefusedAndTheClearedBoxSaved) {
     EXPECT_EQ(f.out.get("Movies.TXT").find("LAST ADDED"), std::string::npos);
     f.dialog.window.userClose();
     EXPECT_EQ(f.main.folder.get("export.dat"),
-              export_test::settings(
+              test_support::crlf(
                   {f.out.path(), " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", "11", "Bottom"}));
 }
 

@@ -5,80 +5,56 @@
 
 #include <gtest/gtest.h>
 
-#include <memory>
-
-#include "tests/support/memory/memory_controls.h"
 #include "tests/support/memory_form1.h"
 
 namespace {
 
-using namespace ui::memory;
-
-// The main window with the new-list dialog on memory controls.
+// The main window with its new-list dialog on memory controls, and the list index `index`.
 struct NewListDialog {
-    explicit NewListDialog(const std::string& index = "") {
-        for (Owned* control :
-             std::initializer_list<Owned*>{&Text1, &Check_info, &Command1, &Command2}) {
-            control->setOwner(&window);
-        }
-        dialog = std::make_unique<new_list::Form_new_list>(
-            new_list::Form_new_listControls{window, Label1, Text1, Check_info, Command1, Command2},
-            f.platform, f.store, *f.form);
-        f.form->setDialogs({&window, nullptr, nullptr});
-        f.folder.put("pemla.dat", index);
-    }
+    explicit NewListDialog(const std::string& index = "") { f.folder.put("pemla.dat", index); }
 
     // Opens the dialog from the main window and creates `name` as a user would; afterwards the
     // dialog is gone and the main window usable again, whatever the outcome.
     void create(const std::string& name, bool information = true) {
         if (!f.view.window.isLoaded()) f.start();
         ASSERT_TRUE(f.view.Command_create.click());
-        Text1.type(name);
-        if (!information) Check_info.userToggle();
-        ASSERT_TRUE(Command1.click());
-        EXPECT_FALSE(window.isLoaded());
+        dialog.Text1.type(name);
+        if (!information) dialog.Check_info.userToggle();
+        ASSERT_TRUE(dialog.Command1.click());
+        EXPECT_FALSE(dialog.window.isLoaded());
         EXPECT_TRUE(f.view.window.isEnabled());
     }
 
     test_support::MainWindowFixture f;
-    MemoryWindow window;
-    MemoryLabel Label1;
-    MemoryTextBox Text1;
-    MemoryCheckBox Check_info;
-    MemoryButton Command1;
-    MemoryButton Command2;
-    std::unique_ptr<new_list::Form_new_list> dialog;
+    test_support::MemoryNewList& dialog = f.newListView;
 };
 
 TEST(NewListDialog, OpensOverADisabledMainWindowAndClosesEveryWay) {
     NewListDialog d;
     d.f.start();
     ASSERT_TRUE(d.f.view.Command_create.click());
-    EXPECT_EQ(d.window.caption() + "|" + d.Label1.caption() + "|" + d.Check_info.caption() + "|" +
-                  d.Command1.caption() + "|" + d.Command2.caption(),
+    EXPECT_EQ(d.dialog.window.caption() + "|" + d.dialog.Label1.caption() + "|" +
+                  d.dialog.Check_info.caption() + "|" + d.dialog.Command1.caption() + "|" +
+                  d.dialog.Command2.caption(),
               "Create new list|Name of new list (only file allowed charters!)|"
               "Include information column|Create|Cancel");
-    EXPECT_TRUE(d.Text1.hasFocus());
+    EXPECT_TRUE(d.dialog.Text1.hasFocus());
     EXPECT_FALSE(d.f.view.Command_create.click()) << "the main window takes no input";
-    d.Text1.type(std::string(30, 'x'));
-    EXPECT_EQ(d.Text1.text(), std::string(26, 'x'));
-    d.Check_info.userToggle();
+    d.dialog.Text1.type(std::string(30, 'x'));
+    EXPECT_EQ(d.dialog.Text1.text(), std::string(26, 'x'));
+    d.dialog.Check_info.userToggle();
 
     const int fronted = d.f.view.window.frontCount();
-    ASSERT_TRUE(d.Command2.click());
-    EXPECT_TRUE(!d.window.isLoaded() && d.f.view.window.isEnabled());
+    ASSERT_TRUE(d.dialog.Command2.click());
+    EXPECT_TRUE(!d.dialog.window.isLoaded() && d.f.view.window.isEnabled());
     EXPECT_GT(d.f.view.window.frontCount(), fronted);
 
-    // Each opening starts afresh; the close box also gives the main window back, and closing
-    // the main window takes an open dialog with it.
+    // Each opening starts afresh; the close box also gives the main window back.
     ASSERT_TRUE(d.f.view.Command_create.click());
-    EXPECT_EQ(d.Text1.text(), "");
-    EXPECT_EQ(d.Check_info.value(), 1);
-    d.window.userClose();
-    EXPECT_TRUE(!d.window.isLoaded() && d.f.view.window.isEnabled());
-    ASSERT_TRUE(d.f.view.Command_create.click());
-    d.f.view.window.userClose();
-    EXPECT_FALSE(d.window.isLoaded());
+    EXPECT_EQ(d.dialog.Text1.text(), "");
+    EXPECT_EQ(d.dialog.Check_info.value(), 1);
+    d.dialog.window.userClose();
+    EXPECT_TRUE(!d.dialog.window.isLoaded() && d.f.view.window.isEnabled());
     EXPECT_EQ(d.f.folder.get("pemla.dat"), "");
 }
 

@@ -22,10 +22,7 @@ const std::string kNotFound = "Can't found that article number!";
 // a list "Jazz" as the new-list dialog leaves it.
 struct SearchDialog {
     SearchDialog() {
-        for (Owned* control :
-             std::initializer_list<Owned*>{&Text1, &Command_search, &Command_cancel, &Text2}) {
-            control->setOwner(&window);
-        }
+        own(window, Text1, Command_search, Command_cancel, Text2);
         dialog = std::make_unique<search::Form_searchart>(
             search::Form_searchartControls{window, Text1, Label1, Command_search, Command_cancel,
                                            Text2},

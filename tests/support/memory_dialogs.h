@@ -22,9 +22,10 @@ struct MemoryNewList {
     ui::memory::MemoryButton Command2;
 };
 
-// The export dialog's controls in memory, offering `drives` as volumes.
+// The export dialog's controls in memory, each owned by the dialog's window; "/" is the only
+// volume until the test offers others.
 struct MemoryFormExport {
-    explicit MemoryFormExport(std::vector<std::string> drives = {"/"});
+    MemoryFormExport();
     exporting::Form_ExportControls controls();
 
     ui::memory::MemoryWindow window;

@@ -9,15 +9,8 @@
 
 namespace ui::memory {
 
-namespace {
-const TextBox* focused = nullptr;
-}  // namespace
-
 void MemoryWindow::show() {
-    if (loaded_) {
-        bringToFront();
-        return;
-    }
+    if (loaded_) return bringToFront();
     loaded_ = true;
     if (onLoad) onLoad();
 }
@@ -57,23 +50,9 @@ void MemoryListBox::setItems(std::vector<std::string> items) {
     selected_ = -1;
 }
 
-void MemoryListBox::clear() {
-    items_.clear();
-    selected_ = -1;
-}
-
-const std::string& MemoryListBox::itemText(int index) const {
-    if (index < 0 || index >= count()) throw std::out_of_range("list box index");
-    return items_[static_cast<std::size_t>(index)];
-}
-
 void MemoryListBox::setSelected(int index, bool selected) {
     if (index < 0 || index >= count()) throw std::out_of_range("list box index");
-    if (selected) {
-        selected_ = index;
-    } else if (selected_ == index) {
-        selected_ = -1;
-    }
+    if (selected || selected_ == index) selected_ = selected ? index : -1;
 }
 
 bool MemoryListBox::userSelect(int index) {
@@ -86,13 +65,7 @@ bool MemoryListBox::userSelect(int index) {
 
 bool MemoryListBox::userSelect(const std::string& text) {
     const auto at = std::find(items_.begin(), items_.end(), text);
-    if (at == items_.end()) return false;
-    return userSelect(static_cast<int>(at - items_.begin()));
-}
-
-std::string MemoryComboBox::itemText(int index) const {
-    if (index < 0 || index >= itemCount()) throw std::out_of_range("combo box index");
-    return items_[static_cast<std::size_t>(index)];
+    return at != items_.end() && userSelect(static_cast<int>(at - items_.begin()));
 }
 
 bool MemoryComboBox::setText(const std::string& text) {
@@ -108,41 +81,27 @@ void MemoryComboBox::type(const std::string& keys) {
         int key = c;
         if (onKeyPress) onKeyPress(key);
         if (key == 0) continue;
+        // A key typed over the selected text replaces it; a backspace only removes it.
         if (std::exchange(allSelected_, false)) {
             text_.clear();
-            if (key == 8) continue;
+        } else if (key == 8 && !text_.empty()) {
+            text_.pop_back();
         }
-        if (key == 8) {
-            if (!text_.empty()) text_.pop_back();
-        } else {
-            text_.push_back(static_cast<char>(key));
-        }
+        if (key != 8) text_.push_back(static_cast<char>(key));
     }
 }
 
 bool MemoryComboBox::userPick(int index) {
     if (!acceptsInput() || index < 0 || index >= itemCount()) return false;
-    text_ = items_[static_cast<std::size_t>(index)];
-    allSelected_ = false;
-    return true;
-}
-
-void MemoryTextBox::setFocus() {
-    focused = this;
-}
-
-bool MemoryTextBox::hasFocus() const {
-    return focused == this;
+    return setText(items_[static_cast<std::size_t>(index)]);
 }
 
 void MemoryTextBox::type(const std::string& keys) {
     if (!acceptsInput()) return;
     for (char c : keys) {
-        if (c == '\b') {
-            if (!text_.empty()) text_.pop_back();
-        } else if (maxLength_ <= 0 || static_cast<int>(text_.size()) < maxLength_) {
-            text_.push_back(c);
-        }
+        const bool fits = maxLength_ <= 0 || static_cast<int>(text_.size()) < maxLength_;
+        if (c == '\b' && !text_.empty()) text_.pop_back();
+        if (c != '\b' && fits) text_.push_back(c);
     }
 }
 
@@ -152,8 +111,9 @@ bool MemoryCheckBox::userToggle() {
     return true;
 }
 
-MemoryDriveList::MemoryDriveList(std::vector<std::string> drives) : drives_(std::move(drives)) {
-    if (!drives_.empty()) drive_ = drives_.front();
+void MemoryDriveList::offer(std::vector<std::string> drives) {
+    drives_ = std::move(drives);
+    drive_ = drives_.empty() ? std::string() : drives_.front();
 }
 
 bool MemoryDriveList::setDrive(const std::string& drive) {
@@ -166,20 +126,18 @@ bool MemoryDriveList::setDrive(const std::string& drive) {
 
 bool MemoryDirList::setPath(const std::string& path) {
     std::error_code ec;
-    if (path.empty() || !std::filesystem::is_directory(path, ec)) return false;
     std::filesystem::directory_iterator probe(path, ec);
     if (ec) return false;
-    std::string clean = path;
-    while (clean.size() > 1 && clean.ends_with('/')) clean.pop_back();
-    path_ = clean;
+    path_ = path;
+    while (path_.size() > 1 && path_.ends_with('/')) path_.pop_back();
     return true;
 }
 
 Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const std::string& title) {
     shown_.push_back({prompt, title, style});
     // A box under the busy pointer looks as if the program were still working.
-    if (busyDepth_ > 0) throw MessageBoxWhileBusy{prompt};
-    if (answers_.empty()) throw UnscriptedMessageBox{prompt, title, style};
+    if (busyDepth_ > 0) throw MessageBoxWhileBusy{shown_.back()};
+    if (answers_.empty()) throw UnscriptedMessageBox{shown_.back()};
     const Answer next = answers_.front();
     answers_.pop_front();
     return next;
@@ -188,11 +146,6 @@ Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const st
 void MemoryPlatform::beginBusy() {
     ++busyDepth_;
     ++busyCount_;
-}
-
-void MemoryPlatform::endProgram(int status) {
-    ended_ = true;
-    endStatus_ = status;
 }
 
 }  // namespace ui::memory

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <deque>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -12,68 +13,69 @@
 // just as a real window takes no input then.
 namespace ui::memory {
 
-class MemoryWindow : public Window {
+// Base of the controls that sit on a window: input is refused while either is disabled.
+class Owned {
+  public:
+    void setOwner(const Window* owner) { owner_ = owner; }
+    bool acceptsInput() const { return ownEnabled_ && (owner_ == nullptr || owner_->isEnabled()); }
+
+  protected:
+    const Window* owner_ = nullptr;
+    bool ownEnabled_ = true;
+};
+
+// Puts each control on `window`.
+template <class... Controls>
+void own(const Window& window, Controls&... controls) {
+    (controls.setOwner(&window), ...);
+}
+
+// The state every kind of control keeps alike: its caption and whether it is enabled. Where the
+// interface of `Base` declares these, they implement it.
+template <class Base>
+class Control : public Base, public Owned {
+  public:
+    void setCaption(const std::string& caption) { caption_ = caption; }
+    std::string caption() const { return caption_; }
+    void setEnabled(bool enabled) { ownEnabled_ = enabled; }
+    bool isEnabled() const { return ownEnabled_; }
+
+  private:
+    std::string caption_;
+};
+
+class MemoryWindow : public Control<Window> {
   public:
     void show() override;
     void unload() override;
     bool isLoaded() const override { return loaded_; }
-    void setEnabled(bool enabled) override { enabled_ = enabled; }
-    bool isEnabled() const override { return enabled_; }
     void bringToFront() override { ++frontCount_; }
-    void setCaption(const std::string& caption) override { caption_ = caption; }
 
     // The user closes the window with its close box.
     void userClose() { unload(); }
-    const std::string& caption() const { return caption_; }
     int frontCount() const { return frontCount_; }
 
   private:
     bool loaded_ = false;
-    bool enabled_ = true;
     int frontCount_ = 0;
-    std::string caption_;
 };
 
-// Base of the controls that sit on a window: input is refused while either is disabled.
-class Owned {
+class MemoryButton : public Control<Button> {
   public:
-    void setOwner(const MemoryWindow* owner) { owner_ = owner; }
-    bool acceptsInput() const { return ownEnabled_ && (owner_ == nullptr || owner_->isEnabled()); }
-
-  protected:
-    const MemoryWindow* owner_ = nullptr;
-    bool ownEnabled_ = true;
-};
-
-class MemoryButton : public Button, public Owned {
-  public:
-    void setCaption(const std::string& caption) override { caption_ = caption; }
-    void setEnabled(bool enabled) override { ownEnabled_ = enabled; }
-    const std::string& caption() const { return caption_; }
     // The user presses the button; false when it takes no input.
     bool click();
-
-  private:
-    std::string caption_;
 };
 
-class MemoryLabel : public Label {
-  public:
-    void setCaption(const std::string& caption) override { caption_ = caption; }
-    std::string caption() const override { return caption_; }
+using MemoryLabel = Control<Label>;
 
-  private:
-    std::string caption_;
-};
-
-class MemoryListBox : public ListBox, public Owned {
+class MemoryListBox : public Control<ListBox> {
   public:
     void addItem(const std::string& text) override;
     bool removeItem(const std::string& text) override;
     void setItems(std::vector<std::string> items) override;
-    void clear() override;
+    void clear() override { setItems({}); }
     int count() const override { return static_cast<int>(items_.size()); }
-    const std::string& itemText(int index) const override;
+    const std::string& itemText(int index) const override { return items_.at(index); }
     int selectedIndex() const override { return selected_; }
     bool selected(int index) const override { return index == selected_; }
     void setSelected(int index, bool selected) override;
@@ -90,18 +92,16 @@ class MemoryListBox : public ListBox, public Owned {
     int selected_ = -1;
 };
 
-class MemoryComboBox : public ComboBox, public Owned {
+class MemoryComboBox : public Control<ComboBox> {
   public:
     explicit MemoryComboBox(bool pickOnly = false) : pickOnly_(pickOnly) {}
     void addItem(const std::string& text) override { items_.push_back(text); }
     void setItems(std::vector<std::string> items) override { items_ = std::move(items); }
     int itemCount() const override { return static_cast<int>(items_.size()); }
-    std::string itemText(int index) const override;
+    std::string itemText(int index) const override { return items_.at(index); }
     std::string text() const override { return text_; }
     bool setText(const std::string& text) override;
     std::size_t selectedLength() const override { return allSelected_ ? text_.size() : 0; }
-    void setEnabled(bool enabled) override { ownEnabled_ = enabled; }
-    bool isEnabled() const override { return ownEnabled_; }
 
     // The user types these characters one by one, each through onKeyPress ('\b' deletes); the
     // first key that gets through replaces a selected text.
@@ -118,43 +118,43 @@ class MemoryComboBox : public ComboBox, public Owned {
     std::string text_;
 };
 
-class MemoryTextBox : public TextBox, public Owned {
+class MemoryTextBox : public Control<TextBox> {
   public:
     std::string text() const override { return text_; }
     void setText(const std::string& text) override { text_ = text; }
     int maxLength() const override { return maxLength_; }
     void setMaxLength(int length) override { maxLength_ = length; }
-    void setFocus() override;
-    bool hasFocus() const override;
+    void setFocus() override { focused_ = this; }
+    bool hasFocus() const override { return focused_ == this; }
 
     // The user types these characters; those beyond the maximum length are refused.
     void type(const std::string& keys);
 
   private:
+    static inline const TextBox* focused_ = nullptr;
     std::string text_;
     int maxLength_ = 0;
 };
 
-class MemoryCheckBox : public CheckBox, public Owned {
+class MemoryCheckBox : public Control<CheckBox> {
   public:
-    void setCaption(const std::string& caption) override { caption_ = caption; }
     int value() const override { return value_; }
     void setValue(int value) override { value_ = value; }
     // The user clicks the box: set becomes clear, anything else set.
     bool userToggle();
-    const std::string& caption() const { return caption_; }
 
   private:
-    std::string caption_;
     int value_ = 0;
 };
 
-class MemoryDriveList : public DriveList, public Owned {
+class MemoryDriveList : public Control<DriveList> {
   public:
-    explicit MemoryDriveList(std::vector<std::string> drives = {"/"});
+    explicit MemoryDriveList(std::vector<std::string> drives = {"/"}) { offer(std::move(drives)); }
     std::vector<std::string> drives() const override { return drives_; }
     std::string drive() const override { return drive_; }
     bool setDrive(const std::string& drive) override;
+    // The volumes mounted from now on; the first is the current drive.
+    void offer(std::vector<std::string> drives);
 
   private:
     std::vector<std::string> drives_;
@@ -162,7 +162,7 @@ class MemoryDriveList : public DriveList, public Owned {
 };
 
 // Follows the real file system: a path is accepted when it names a readable folder.
-class MemoryDirList : public DirList, public Owned {
+class MemoryDirList : public Control<DirList> {
   public:
     std::string path() const override { return path_; }
     bool setPath(const std::string& path) override;
@@ -171,24 +171,19 @@ class MemoryDirList : public DirList, public Owned {
     std::string path_ = "/";
 };
 
-// Thrown by a message box shown while the busy pointer is on, or one that a test did not script.
-// Deliberately not std::exceptions, so that no handler guard can swallow them: the test fails.
-struct MessageBoxWhileBusy {
-    std::string prompt;
-};
-struct UnscriptedMessageBox {
+// A message box as shown. Thrown when shown under the busy pointer, or when the test did not
+// script it: deliberately no std::exception, so that no handler guard can swallow it.
+struct MessageBox {
     std::string prompt;
     std::string title;
     int style;
 };
+struct MessageBoxWhileBusy : MessageBox {};
+struct UnscriptedMessageBox : MessageBox {};
 
 class MemoryPlatform : public Platform {
   public:
-    struct Shown {
-        std::string prompt;
-        std::string title;
-        int style;
-    };
+    using Shown = MessageBox;
 
     // Scripts the answer to the next message box.
     void answer(Answer next) { answers_.push_back(next); }
@@ -197,14 +192,14 @@ class MemoryPlatform : public Platform {
     std::string shortDate() override { return "06.12.2026"; }
     void beginBusy() override;
     void endBusy() override { --busyDepth_; }
-    void endProgram(int status) override;
+    void endProgram(int status) override { ended_ = status; }
 
     const std::vector<Shown>& shown() const { return shown_; }
     int beeps() const { return beeps_; }
     int busyDepth() const { return busyDepth_; }
     int busyCount() const { return busyCount_; }
-    bool ended() const { return ended_; }
-    int endStatus() const { return endStatus_; }
+    bool ended() const { return ended_.has_value(); }
+    int endStatus() const { return ended_.value_or(0); }
 
   private:
     std::deque<Answer> answers_;
@@ -212,8 +207,7 @@ class MemoryPlatform : public Platform {
     int beeps_ = 0;
     int busyDepth_ = 0;
     int busyCount_ = 0;
-    bool ended_ = false;
-    int endStatus_ = 0;
+    std::optional<int> ended_;  // the status the program ended with
 };
 
 }  // namespace ui::memory
