@@ -10,6 +10,7 @@
 #include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
+#include "catalogue/utf8.h"
 
 namespace catalogue {
 namespace {
@@ -63,6 +64,22 @@ TEST(FileText, NumbersReadAndWritten) {
 
     EXPECT_EQ(fileNumber(1) + fileNumber(0) + fileNumber(-3), " 1  0 -3 ");
     EXPECT_EQ(labelNumber(32767) + labelNumber(0) + labelNumber(-3), " 32767 0-3");
+
+    // Decimals, as the export settings and the last-added amount hold them: value, whether any
+    // digit was read, where the reading stopped.
+    const struct {
+        const char* text;
+        double value;
+        bool digits;
+        std::size_t end;
+    } decimals[] = {{"-1.05x", -1.05, true, 5}, {"+20", 20, true, 3}, {".5", 0.5, true, 2},
+                    {"3.", 3, true, 2},         {"-", 0, false, 1},   {"x1", 0, false, 0}};
+    for (const auto& d : decimals) {
+        const Decimal read = readDecimal(d.text);
+        EXPECT_DOUBLE_EQ(read.value, d.value) << d.text;
+        EXPECT_EQ(read.digits, d.digits) << d.text;
+        EXPECT_EQ(read.end, d.end) << d.text;
+    }
 }
 
 constexpr auto npos = std::string_view::npos;
@@ -75,6 +92,18 @@ TEST(FileNames, EveryLatin1NameHasOneUtf8NameAndOnlyThoseDecode) {
     for (const std::string bytes :
          {"\xC1\x81", "\xD0\x94", "\xE2\x82\xAC", "a\xC3", "\xC3(", "\xA9"})
         EXPECT_EQ(shownName(bytes), bytes);
+}
+
+// A character the list's files cannot hold is named by its code point, four-byte ones included.
+TEST(Utf8, ConvertsToLatin1OrNamesTheCharacterOutside) {
+    EXPECT_EQ(utf8ToLatin1("\xC3\x89t\xC3\xA9"), "\xC9t\xE9");
+    const std::pair<std::string, char32_t> outsiders[] = {{"a\xE2\x82\xAC", 0x20AC},
+                                                          {"\xF4\x8F\xBF\xBF", 0x10FFFF}};
+    for (const auto& [text, code] : outsiders) {
+        char32_t outside = 0;
+        EXPECT_FALSE(utf8ToLatin1(text, &outside));
+        EXPECT_EQ(outside, code);
+    }
 }
 
 TEST(Latin1, FoldsAsciiAndAccentedLettersOnly) {
