@@ -3,6 +3,7 @@
 // files is the catalogue suite's.
 #include "bench/catalogue_maker.h"
 #include "catalogue/entry_rules.h"
+#include "catalogue/journal.h"
 #include "tests/main_window/form1_test_fixture.h"
 
 namespace main_window_test {
@@ -196,6 +197,36 @@ TEST_F(Form1Test, DeleteListAsksTwiceAndShowsTheListsLeft) {
     open(placeholder);
     EXPECT_EQ(titles(), (Strings{"Add an item and delete me!"}));
     EXPECT_EQ(platform.shown().size(), 7u);
+}
+
+// Each writing button, once its questions are answered, first finishes a change that an earlier
+// run left unfinished, says so, and stops there: it writes nothing else.
+TEST_F(Form1Test, EveryEditFinishesAnEarlierChangeFirstAndStops) {
+    putRock(folder);
+    start();
+    open("Rock");
+    const Files before = files();
+    const std::pair<ui::memory::MemoryButton*, int> buttons[] = {{&view.Command_add, 0},
+                                                                 {&view.Command_change, 0},
+                                                                 {&view.Command_delentry, 1},
+                                                                 {&view.Command_delete, 2}};
+    for (const auto& [button, questions] : buttons) {
+        select("abc");
+        fill({"New", "CD", "1", ""});
+        folder.put("left.del", "");
+        folder.put(std::string(catalogue::kJournalName),
+                   catalogue::encodeJournal({{}, {"left.del"}, {}}));
+        const std::size_t boxes = platform.shown().size();
+        for (int i = 0; i < questions; ++i) platform.answer(Answer::Yes);
+        platform.answer(Answer::Ok);
+        button->click();
+        ASSERT_EQ(platform.shown().size(), boxes + questions + 1) << button->caption();
+        EXPECT_TRUE(platform.shown().back().prompt.starts_with(
+            "An earlier change that was left unfinished has now been completed, so nothing else "
+            "was done."))
+            << platform.shown().back().prompt;
+        EXPECT_EQ(files(), before) << button->caption();
+    }
 }
 
 }  // namespace
