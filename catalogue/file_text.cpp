@@ -65,10 +65,13 @@ std::string toFileText(std::string_view bytes) {
     return text;
 }
 
+std::string forWriting(std::string&& text) {
+    if (!text.empty() && !text.ends_with(kCrLf)) text.append(kCrLf);
+    return std::move(text);
+}
+
 std::string forWriting(std::string_view text) {
-    std::string out(text);
-    if (!out.empty() && !out.ends_with(kCrLf)) out.append(kCrLf);
-    return out;
+    return forWriting(std::string(text));
 }
 
 std::optional<long> firstNumber(std::string_view bytes) {

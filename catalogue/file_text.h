@@ -44,6 +44,11 @@ inline std::string toFileText(const char* bytes) {
 // The bytes to store for a text: unchanged when it ends with CR LF, otherwise followed by one
 // CR LF. The empty text stays empty.
 std::string forWriting(std::string_view text);
+// The same, taking the text over instead of copying it.
+std::string forWriting(std::string&& text);
+inline std::string forWriting(const char* text) {
+    return forWriting(std::string_view(text));
+}
 
 // The first number in some bytes, read as a printed integer: leading blanks skipped, an optional
 // sign, digits. Nothing when the bytes do not start with a number.

@@ -137,7 +137,7 @@ std::string appendEntry(std::string_view entries, const Entry& entry) {
     text.reserve(entries.size() + kCrLf.size() + entry.title.size() + entry.type.size() +
                  entry.discs.size() + entry.information.size() + 20);
     text.append(entries);
-    if (!text.empty() && !text.ends_with(kCrLf)) text.append(kCrLf);
+    text = forWriting(std::move(text));
     text.append(entryLines(entry));
     return text;
 }

@@ -14,15 +14,6 @@
 // the rows taken in so far.
 namespace catalogue::import_titles {
 
-// Latin-1 letter case folded by table: every title is folded once, byte by byte.
-inline const std::array<char, 256> kFolded = [] {
-    std::array<char, 256> table{};
-    for (std::size_t c = 0; c < table.size(); ++c) {
-        table[c] = static_cast<char>(foldByte(static_cast<unsigned char>(c)));
-    }
-    return table;
-}();
-
 // The titles of a list folded, each kept once in one text and found through open addressing,
 // so that a title costs no allocation of its own. A slot is eight bytes (part of the hash, and
 // which title), so the table of a full list stays in the processor's cache.
@@ -46,7 +37,8 @@ class TitleSet {
         }
         char* const key = keys_.data() + used;
         for (std::size_t i = 0; i < title.size(); ++i) {
-            key[i] = kFolded[static_cast<unsigned char>(title[i])];
+            key[i] =
+                static_cast<char>(list_order::kFoldTable[static_cast<unsigned char>(title[i])]);
         }
         length_ = title.size();
         tag_ = hashOf(key, length_);

@@ -40,8 +40,7 @@ void Transaction::write(const std::string& name, std::string_view text) {
 }
 
 void Transaction::write(const std::string& name, std::string&& text) {
-    if (!text.empty() && !text.ends_with(kCrLf)) text.append(kCrLf);
-    actions_.push_back({name, Kind::Write, std::move(text)});
+    actions_.push_back({name, Kind::Write, forWriting(std::move(text))});
 }
 
 void Transaction::remove(const std::string& name) {

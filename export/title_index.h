@@ -168,15 +168,6 @@ class EntryIndex {
     mutable std::array<std::optional<std::vector<std::size_t>>, 3> markers_;  // type, discs, info
 };
 
-// Latin-1 letter case folded by table.
-inline const std::array<std::uint8_t, 256> kFoldTable = [] {
-    std::array<std::uint8_t, 256> table{};
-    for (std::size_t c = 0; c < table.size(); ++c) {
-        table[c] = catalogue::foldByte(static_cast<unsigned char>(c));
-    }
-    return table;
-}();
-
 // Hashing and comparing titles ignoring Latin-1 case, without building folded copies. The hash
 // takes eight folded bytes at a time; eight ASCII bytes are folded at once.
 struct FoldedHash {
@@ -195,8 +186,10 @@ struct FoldedHash {
             } else {
                 word = 0;
                 for (std::size_t b = 0; b < n; ++b) {
-                    word |= std::uint64_t{kFoldTable[static_cast<unsigned char>(text[at + b])]}
-                            << (8 * b);
+                    word |=
+                        std::uint64_t{
+                            list_order::kFoldTable[static_cast<unsigned char>(text[at + b])]}
+                        << (8 * b);
                 }
             }
             h = (h ^ word) * 0xFF51AFD7ED558CCDull;

@@ -22,13 +22,6 @@ bool itemLess(std::string_view a, std::string_view b) {
 
 namespace {
 
-const std::array<unsigned char, 256> kFolded = [] {
-    std::array<unsigned char, 256> table{};
-    for (std::size_t c = 0; c < table.size(); ++c)
-        table[c] = foldByte(static_cast<unsigned char>(c));
-    return table;
-}();
-
 // Bytes `from` to `from` + 7 of a folded text as one number, the first byte highest and zeros
 // past the text's end. Eight bytes are read from `from` on, past the end too: the caller keeps
 // them readable.
@@ -61,7 +54,7 @@ void sortItems(std::vector<std::string>& items) {
     for (std::size_t i = 0; i < items.size(); ++i) {
         starts[i] = static_cast<std::size_t>(to - folded.data());
         for (const char c : items[i])
-            *to++ = static_cast<char>(kFolded[static_cast<unsigned char>(c)]);
+            *to++ = static_cast<char>(kFoldTable[static_cast<unsigned char>(c)]);
     }
     starts[items.size()] = total;
     const auto key = [&](std::size_t i) {

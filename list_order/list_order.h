@@ -1,5 +1,7 @@
 #pragma once
 
+#include <array>
+#include <cstddef>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -13,6 +15,14 @@ inline unsigned char foldByte(unsigned char c) {
     if ((c >= 'A' && c <= 'Z') || (c >= 0xC0 && c <= 0xDE && c != 0xD7)) return c + 0x20;
     return c;
 }
+
+// foldByte() of every byte, for loops that fold long texts.
+inline const std::array<unsigned char, 256> kFoldTable = [] {
+    std::array<unsigned char, 256> table{};
+    for (std::size_t c = 0; c < table.size(); ++c)
+        table[c] = foldByte(static_cast<unsigned char>(c));
+    return table;
+}();
 
 // Case-insensitive, ties broken by byte value.
 bool itemLess(std::string_view a, std::string_view b);
