@@ -140,9 +140,9 @@ TEST(ExportRun, ATopTextThatIsAFifoIsLeftOutWithoutWaiting) {
 TEST(ExportRun, NoSelectedListOnlyBeeps) {
     OpenMovies f;
     f.main.view.List_list.setSelected(0, false);
-    const int beeps = f.main.platform.beeps();
+    const int beeps = f.main.platform.beeps;
     EXPECT_TRUE(f.exportNow(0).empty());
-    EXPECT_EQ(f.main.platform.beeps(), beeps + 1);
+    EXPECT_EQ(f.main.platform.beeps, beeps + 1);
     EXPECT_EQ(f.out.listing(), "");
 }
 

@@ -105,9 +105,9 @@ TEST(ExportSettingsLoad, TheDriveIsTheVolumeHoldingTheFolder) {
     ASSERT_TRUE(f.dialog.Drive1.setDrive("/"));
     EXPECT_EQ(f.dialog.Dir1.path(), "/");
     ASSERT_TRUE(f.dialog.Dir1.setPath(f.out.path()));
-    const int beeps = f.main.platform.beeps();
+    const int beeps = f.main.platform.beeps;
     ASSERT_TRUE(f.dialog.Drive1.setDrive("/no-such-volume"));
-    EXPECT_EQ(f.main.platform.beeps(), beeps + 1);
+    EXPECT_EQ(f.main.platform.beeps, beeps + 1);
     EXPECT_EQ(f.dialog.Dir1.path(), f.out.path());
     EXPECT_EQ(f.dialog.Drive1.drive(), volume);
 }

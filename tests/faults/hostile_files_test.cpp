@@ -235,7 +235,7 @@ TEST(StartUp, FinishesAHalfCarriedOutJournalOrStopsAtOneItCannotRead) {
     EXPECT_TRUE(stopped.errors().front().prompt.starts_with(
         "Pemla cannot start: the file \"pemla.journal\""))
         << stopped.errors().front().prompt;
-    EXPECT_TRUE(stopped.platform.ended());
+    EXPECT_TRUE(stopped.platform.ended);
 }
 
 }  // namespace

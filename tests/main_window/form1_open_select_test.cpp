@@ -61,7 +61,7 @@ TEST_F(Form1Test, OpeningShowsTheTitlesSortedAndSelectingOneFillsTheFields) {
     startWithRock();
     EXPECT_EQ(titles(), (Strings{"1st", "abc", "abcd", "xabc", "Zebra"}));
     EXPECT_EQ(view.Label2.caption(), "... amount:  5 ...");
-    EXPECT_EQ(platform.busyCount(), 1);
+    EXPECT_EQ(platform.busyCount, 1);
     // abcd stands before abc in both files and xabc ends with abc: each finds its own.
     for (const char* shown : {"abc|Game|3||A002", "abcd|DVD|2|Copy|A001", "xabc|CD|10|x|X001",
                               "Zebra|CD|1|Original|Z001", "1st|LP|1|Original|!001"}) {
@@ -69,7 +69,7 @@ TEST_F(Form1Test, OpeningShowsTheTitlesSortedAndSelectingOneFillsTheFields) {
         select(expected.substr(0, expected.find('|')));
         EXPECT_EQ(fields(), expected);
     }
-    EXPECT_EQ(platform.busyDepth(), 0);
+    EXPECT_EQ(platform.busyDepth, 0);
 
     select("abc");
     view.Combo1.type("xyz");
@@ -171,7 +171,7 @@ TEST_F(Form1Test, FindSelectsMatchingTitlesInTurnAndNeverHidesOne) {
         if (s.selected.empty()) ++beeps;
         if (!s.selected.empty()) shown = s.selected;
         EXPECT_EQ(view.Text1.text(), shown);
-        EXPECT_EQ(platform.beeps(), beeps);
+        EXPECT_EQ(platform.beeps, beeps);
         EXPECT_EQ(view.List1.count(), 6);
         EXPECT_EQ(view.Label2.caption(), "... amount:  6 ...");
     }

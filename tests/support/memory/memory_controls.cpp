@@ -136,7 +136,7 @@ bool MemoryDirList::setPath(const std::string& path) {
 Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const std::string& title) {
     shown_.push_back({prompt, title, style});
     // A box under the busy pointer looks as if the program were still working.
-    if (busyDepth_ > 0) throw MessageBoxWhileBusy{shown_.back()};
+    if (busyDepth > 0) throw MessageBoxWhileBusy{shown_.back()};
     if (answers_.empty()) throw UnscriptedMessageBox{shown_.back()};
     const Answer next = answers_.front();
     answers_.pop_front();
@@ -144,8 +144,8 @@ Answer MemoryPlatform::messageBox(const std::string& prompt, int style, const st
 }
 
 void MemoryPlatform::beginBusy() {
-    ++busyDepth_;
-    ++busyCount_;
+    ++busyDepth;
+    ++busyCount;
 }
 
 }  // namespace ui::memory

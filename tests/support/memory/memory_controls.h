@@ -49,15 +49,14 @@ class MemoryWindow : public Control<Window> {
     void show() override;
     void unload() override;
     bool isLoaded() const override { return loaded_; }
-    void bringToFront() override { ++frontCount_; }
+    void bringToFront() override { ++frontCount; }
 
     // The user closes the window with its close box.
     void userClose() { unload(); }
-    int frontCount() const { return frontCount_; }
+    int frontCount = 0;
 
   private:
     bool loaded_ = false;
-    int frontCount_ = 0;
 };
 
 class MemoryButton : public Control<Button> {
@@ -188,26 +187,21 @@ class MemoryPlatform : public Platform {
     // Scripts the answer to the next message box.
     void answer(Answer next) { answers_.push_back(next); }
     Answer messageBox(const std::string& prompt, int style, const std::string& title) override;
-    void beep() override { ++beeps_; }
+    void beep() override { ++beeps; }
     std::string shortDate() override { return "06.12.2026"; }
     void beginBusy() override;
-    void endBusy() override { --busyDepth_; }
-    void endProgram(int status) override { ended_ = status; }
+    void endBusy() override { --busyDepth; }
+    void endProgram(int status) override { ended = status; }
 
     const std::vector<Shown>& shown() const { return shown_; }
-    int beeps() const { return beeps_; }
-    int busyDepth() const { return busyDepth_; }
-    int busyCount() const { return busyCount_; }
-    bool ended() const { return ended_.has_value(); }
-    int endStatus() const { return ended_.value_or(0); }
+    int beeps = 0;
+    int busyDepth = 0;
+    int busyCount = 0;
+    std::optional<int> ended;  // the status the program ended with
 
   private:
     std::deque<Answer> answers_;
     std::vector<Shown> shown_;
-    int beeps_ = 0;
-    int busyDepth_ = 0;
-    int busyCount_ = 0;
-    std::optional<int> ended_;  // the status the program ended with
 };
 
 }  // namespace ui::memory
