@@ -1,7 +1,5 @@
 #include "tests/export/export_fixture.h"
 
-#include <gtest/gtest.h>
-
 #include <cstdlib>
 #include <fstream>
 #include <iterator>
@@ -24,14 +22,10 @@ ExportFixture::~ExportFixture() {
 }
 
 void ExportFixture::openMovies(const std::string& flag) {
-    main.putList("Movies", data("movies.dat"), data("movies.art"), "A#003\r\n", flag);
+    main.folder.putList("Movies", data("movies.dat"), data("movies.art"), "A#003\r\n", flag);
     main.folder.put("pemla.dat", "Movies\r\n");
     main.start();
     main.open("Movies");
-}
-
-void ExportFixture::openDialog() {
-    ASSERT_TRUE(main.view.Command_export.click());
 }
 
 }  // namespace export_test

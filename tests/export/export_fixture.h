@@ -1,5 +1,7 @@
 #pragma once
 
+#include <gtest/gtest.h>
+
 #include <string>
 #include <vector>
 
@@ -22,7 +24,7 @@ class ExportFixture {
     // opens the list in it.
     void openMovies(const std::string& flag = " 1 \r\n");
     // The main window's "Export pemla" button.
-    void openDialog();
+    void openDialog() { ASSERT_TRUE(main.view.Command_export.click()); }
 
     test_support::TempFolder home;
     test_support::MainWindowFixture main;

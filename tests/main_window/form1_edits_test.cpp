@@ -18,8 +18,7 @@ TEST_F(Form1Test, AddShowsTheNewTitleAndEmptiesTheFieldsOrKeepsThemWithTheRefusa
     start();
     Files before = files();
     fill({"Orphan", "CD", "1", ""});
-    platform.answer(Answer::Ok);
-    view.Command_add.click();
+    press(view.Command_add, {Answer::Ok});
     expectBox(0, 16, "Error",
               "No list is open, so the title was not added. Select the list to add it to, then "
               "press Add again.");
@@ -41,8 +40,7 @@ TEST_F(Form1Test, AddShowsTheNewTitleAndEmptiesTheFieldsOrKeepsThemWithTheRefusa
     for (const catalogue::Entry& refused :
          {catalogue::Entry{"ABC", "CD", "1", "Copy"}, catalogue::Entry{"a<|?b", "CD", "1", ""}}) {
         fill(refused);
-        platform.answer(Answer::Ok);
-        view.Command_add.click();
+        press(view.Command_add, {Answer::Ok});
         EXPECT_EQ(platform.shown().back().prompt, catalogue::entryRefusal(refused).empty()
                                                       ? catalogue::kDuplicateTitle
                                                       : catalogue::entryRefusal(refused));
@@ -64,8 +62,7 @@ TEST_F(Form1Test, AFullListRefusesAnAdd) {
     EXPECT_EQ(view.Label2.caption(), "... amount:  32767 ...");
     const Files before = files();
     fill({"One too many", "CD", "1", ""});
-    platform.answer(Answer::Ok);
-    view.Command_add.click();
+    press(view.Command_add, {Answer::Ok});
     expectBox(0, 16, "Error", catalogue::kListFull);
     EXPECT_EQ(files(), before);
 }
@@ -73,29 +70,25 @@ TEST_F(Form1Test, AFullListRefusesAnAdd) {
 TEST_F(Form1Test, ChangeAsksFirstAndShowsTheChangedTitle) {
     startWithRock();
     const Files before = files();
-    platform.answer(Answer::Ok);
-    view.Command_change.click();
+    press(view.Command_change, {Answer::Ok});
     expectBox(0, 16, "Error", "Select the entry to change in the list first.");
 
     // A value the files cannot hold is refused before the question.
     select("abc");
     retype(view.Combo1, "a<|*");
-    platform.answer(Answer::Ok);
-    view.Command_change.click();
+    press(view.Command_change, {Answer::Ok});
     expectBox(1, 16, "Error");
 
     select("abc");
     retype(view.Combo1, "LP");
-    platform.answer(Answer::No);
-    view.Command_change.click();
+    press(view.Command_change, {Answer::No});
     expectBox(2, 4, "Change item", "Are ya sure yo want to change selected entry?");
     expectReset();
     EXPECT_EQ(files(), before);
 
     select("abc");
     retype(view.Text1, "Quartz");
-    platform.answer(Answer::Yes);
-    view.Command_change.click();
+    press(view.Command_change, {Answer::Yes});
     EXPECT_EQ(titles(), (Strings{"1st", "abcd", "Quartz", "xabc", "Zebra"}));
     expectReset();
     EXPECT_EQ(platform.shown().size(), 4u);
@@ -109,15 +102,13 @@ TEST_F(Form1Test, DeleteEntryAsksFirstAndKeepsTheDeletedValuesInTheFields) {
     view.Command_delentry.click();  // nothing selected: nothing asked
     EXPECT_TRUE(platform.shown().empty());
     select("abc");
-    platform.answer(Answer::No);
-    view.Command_delentry.click();
+    press(view.Command_delentry, {Answer::No});
     expectBox(0, 260, "Change item", "Are ya sure yo want to DELETE selected entry?");
     EXPECT_EQ(fields(), "abc|Game|3||A002");
     EXPECT_EQ(files(), before);
 
     select("xabc");
-    platform.answer(Answer::Yes);
-    view.Command_delentry.click();
+    press(view.Command_delentry, {Answer::Yes});
     EXPECT_EQ(titles(), (Strings{"1st", "abc", "abcd", "Zebra"}));
     EXPECT_EQ(view.Label2.caption(), "... amount:  4 ...");
     EXPECT_EQ(fields(), "xabc|CD|10|x|X001");
@@ -142,8 +133,7 @@ TEST_F(Form1Test, AnEditedListEqualsAFullRefill) {
         } else {
             ASSERT_TRUE(select(selected));
             if (!title.empty()) retype(view.Text1, title);
-            platform.answer(Answer::Yes);
-            (title.empty() ? view.Command_delentry : view.Command_change).click();
+            press(title.empty() ? view.Command_delentry : view.Command_change, {Answer::Yes});
         }
         ui::memory::MemoryListBox refill;
         refill.setItems(*catalogue::entryTitles(folder.get("Rock.dat")));
@@ -160,8 +150,7 @@ TEST_F(Form1Test, DeletingTheOnlyEntryShowsThePlaceholder) {
     start();
     open("Solo");
     select("Jazz Album");
-    platform.answer(Answer::Yes);
-    view.Command_delentry.click();
+    press(view.Command_delentry, {Answer::Yes});
     expectReset();
     EXPECT_EQ(view.Label2.caption(), "... amount:  1 ...");
     select("Add an item and delete me!");
@@ -174,21 +163,16 @@ TEST_F(Form1Test, DeleteListAsksTwiceAndShowsTheListsLeft) {
     const Files before = files();
     view.Command_delete.click();  // nothing selected: nothing asked
     open("Rock");
-    platform.answer(Answer::No);
-    view.Command_delete.click();
+    press(view.Command_delete, {Answer::No});
     expectBox(0, 260, "DELETE?", kDeleteList);
-    platform.answer(Answer::Yes);
-    platform.answer(Answer::No);
-    view.Command_delete.click();
+    press(view.Command_delete, {Answer::Yes, Answer::No});
     EXPECT_EQ(platform.shown()[1].prompt, kDeleteList);
     expectBox(2, 308, "DELETE?", "ARE YA REALLY SURE?");
     EXPECT_EQ(files(), before);
 
     for (const std::string list : {"Rock", "Jazz"}) {
         open(list);
-        platform.answer(Answer::Yes);
-        platform.answer(Answer::Yes);
-        view.Command_delete.click();
+        press(view.Command_delete, {Answer::Yes, Answer::Yes});
     }
     const std::string placeholder(catalogue::kPlaceholderList);
     EXPECT_EQ(view.List_list.items(), (Strings{placeholder}));
@@ -202,25 +186,22 @@ TEST_F(Form1Test, DeleteListAsksTwiceAndShowsTheListsLeft) {
 // Each writing button, once its questions are answered, first finishes a change that an earlier
 // run left unfinished, says so, and stops there: it writes nothing else.
 TEST_F(Form1Test, EveryEditFinishesAnEarlierChangeFirstAndStops) {
-    putRock(folder);
-    start();
-    open("Rock");
+    startWithRock();
     const Files before = files();
-    const std::pair<ui::memory::MemoryButton*, int> buttons[] = {{&view.Command_add, 0},
-                                                                 {&view.Command_change, 0},
-                                                                 {&view.Command_delentry, 1},
-                                                                 {&view.Command_delete, 2}};
-    for (const auto& [button, questions] : buttons) {
+    const std::pair<ui::memory::MemoryButton*, std::vector<Answer>> buttons[] = {
+        {&view.Command_add, {Answer::Ok}},
+        {&view.Command_change, {Answer::Ok}},
+        {&view.Command_delentry, {Answer::Yes, Answer::Ok}},
+        {&view.Command_delete, {Answer::Yes, Answer::Yes, Answer::Ok}}};
+    for (const auto& [button, answers] : buttons) {
         select("abc");
         fill({"New", "CD", "1", ""});
         folder.put("left.del", "");
         folder.put(std::string(catalogue::kJournalName),
                    catalogue::encodeJournal({{}, {"left.del"}, {}}));
         const std::size_t boxes = platform.shown().size();
-        for (int i = 0; i < questions; ++i) platform.answer(Answer::Yes);
-        platform.answer(Answer::Ok);
-        button->click();
-        ASSERT_EQ(platform.shown().size(), boxes + questions + 1) << button->caption();
+        press(*button, answers);
+        ASSERT_EQ(platform.shown().size(), boxes + answers.size()) << button->caption();
         EXPECT_TRUE(platform.shown().back().prompt.starts_with(
             "An earlier change that was left unfinished has now been completed, so nothing else "
             "was done."))

@@ -44,10 +44,10 @@ TEST(NewListDialog, OpensOverADisabledMainWindowAndClosesEveryWay) {
     EXPECT_EQ(d.dialog.Text1.text(), std::string(26, 'x'));
     d.dialog.Check_info.userToggle();
 
-    const int fronted = d.f.view.window.frontCount();
+    const int fronted = d.f.view.window.frontCount;
     ASSERT_TRUE(d.dialog.Command2.click());
     EXPECT_TRUE(!d.dialog.window.isLoaded() && d.f.view.window.isEnabled());
-    EXPECT_GT(d.f.view.window.frontCount(), fronted);
+    EXPECT_GT(d.f.view.window.frontCount, fronted);
 
     // Each opening starts afresh; the close box also gives the main window back.
     ASSERT_TRUE(d.f.view.Command_create.click());
@@ -60,7 +60,8 @@ TEST(NewListDialog, OpensOverADisabledMainWindowAndClosesEveryWay) {
 
 TEST(NewListDialog, CreatesTheListAndRefillsTheMainWindowOrShowsTheRefusal) {
     NewListDialog d("Rock\r\nPop\r\n");
-    d.f.putList("Pop", "<|?Abba Gold\r\n<|'CD\r\n<||1\r\n<|*Original\r\n", "Abba Gold#*\\A001\r\n");
+    d.f.folder.putList("Pop", "<|?Abba Gold\r\n<|'CD\r\n<||1\r\n<|*Original\r\n",
+                       "Abba Gold#*\\A001\r\n");
     d.f.start();
     d.f.open("Pop");
     ASSERT_EQ(d.f.view.List1.count(), 1);
@@ -82,10 +83,7 @@ TEST(NewListDialog, CreatesTheListAndRefillsTheMainWindowOrShowsTheRefusal) {
     const std::string before = d.f.folder.listing() + d.f.folder.get("pemla.dat");
     d.f.platform.answer(ui::Answer::Ok);
     d.create("jazz caf\xC9");
-    ASSERT_EQ(d.f.platform.shown().size(), 1u);
-    const auto& box = d.f.platform.shown()[0];
-    EXPECT_EQ(box.title + " " + std::to_string(box.style) + ": " + box.prompt,
-              "Error 16: " + std::string(new_list::kNameInUse));
+    d.f.expectBox(0, 16, "Error", new_list::kNameInUse);
     EXPECT_EQ(d.f.folder.listing() + d.f.folder.get("pemla.dat"), before);
 }
 

@@ -5,12 +5,9 @@
 namespace test_support {
 
 MemoryForm1::MemoryForm1() {
-    for (ui::memory::Owned* control : std::initializer_list<ui::memory::Owned*>{
-             &List_list, &Command_create, &Command_delete, &List1, &Command_search,
-             &Command_delentry, &Command_export, &Command_print, &Text1, &Combo1, &Combo2, &Combo3,
-             &Textart, &Command_add, &Command_change, &Command_clear}) {
-        control->setOwner(&window);
-    }
+    ui::memory::own(window, List_list, Command_create, Command_delete, List1, Command_search,
+                    Command_delentry, Command_export, Command_print, Text1, Combo1, Combo2, Combo3,
+                    Textart, Command_add, Command_change, Command_clear);
 }
 
 main_window::Form1Controls MemoryForm1::controls() {
@@ -29,10 +26,6 @@ MainWindowFixture::MainWindowFixture()
     folder.put("information.dat", "Information\r\nOriginal\r\nCopy\r\n");
     folder.put("pemla.dat", "");
     form->setDialogs({&newListView.window, &exportView.window, nullptr});
-}
-
-void MainWindowFixture::start() {
-    view.window.show();
 }
 
 bool MainWindowFixture::open(const std::string& list) {
@@ -55,14 +48,12 @@ void MainWindowFixture::fill(const catalogue::Entry& e) {
 }
 
 void MainWindowFixture::addDylan(const std::string& information) {
-    platform.answer(ui::Answer::Ok);
     fill({"Dylan", "Game", "1", information});
-    view.Command_add.click();
+    press(view.Command_add, {ui::Answer::Ok});
 }
 
 void MainWindowFixture::deleteList() {
-    for (ui::Answer a : {ui::Answer::Yes, ui::Answer::Yes, ui::Answer::Ok}) platform.answer(a);
-    view.Command_delete.click();
+    press(view.Command_delete, {ui::Answer::Yes, ui::Answer::Yes, ui::Answer::Ok});
 }
 
 void MainWindowFixture::createList(const std::string& name) {

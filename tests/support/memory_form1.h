@@ -50,13 +50,8 @@ struct MemoryForm1 {
 struct MainWindowFixture {
     MainWindowFixture();
 
-    // Writes a list's files into the catalogue folder (see TempFolder::putList).
-    void putList(const std::string& name, const std::string& entries, const std::string& articles,
-                 const std::string& counter = "A#001\r\n", const std::string& flag = " 1 \r\n") {
-        folder.putList(name, entries, articles, counter, flag);
-    }
     // Loads the main window (its start-up runs).
-    void start();
+    void start() { view.window.show(); }
     // The user selects a list, or a title of the open list; false (and a failure) when it is
     // not shown.
     bool open(const std::string& list);
@@ -66,6 +61,11 @@ struct MainWindowFixture {
     template <typename Box>
     static void retype(Box& box, const std::string& text) {
         box.type(std::string(box.text().size(), '\b') + text);
+    }
+    // The user presses the button, the message boxes it shows answered in this order.
+    void press(ui::memory::MemoryButton& button, const std::vector<ui::Answer>& answers = {}) {
+        for (ui::Answer answer : answers) platform.answer(answer);
+        button.click();
     }
     // The user adds "Dylan" (Game, 1) with this information to the open list, or deletes the
     // selected list confirming twice; an error box, should one come, is answered.
