@@ -8,7 +8,6 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstdio>
-#include <iostream>
 
 namespace test_support {
 
@@ -22,21 +21,14 @@ FaultySys::~FaultySys() {
     for (const auto& item : openFiles_) ::close(item.first);
 }
 
-void FaultySys::failAt(SysCall kind, int n, int errnum, int times) {
-    failKind_ = kind;
-    failAt_ = n;
-    failTimes_ = times;
-    failErrno_ = errnum;
-}
-
 bool FaultySys::fault(SysCall kind, const Hit& file) {
     if (killStep_ > 0 && steps_ + 1 == killStep_) ::raise(SIGKILL);
     ++steps_;
     const int count = ++counts_[static_cast<std::size_t>(kind)];
-    if (failAt_ > 0 && kind == failKind_ && count >= failAt_ && count < failAt_ + failTimes_) {
-        if (!fired_) hit_ = file;
-        fired_ = true;
-        errno = failErrno_;
+    const auto& p = planned_;
+    if (p.at > 0 && kind == p.kind && count >= p.at && count < p.at + p.times) {
+        if (!hit_) hit_ = file;
+        errno = p.errnum;
         return true;
     }
     return false;
@@ -89,8 +81,7 @@ int FaultySys::unlink(const std::string& path) {
 }
 
 int inChild(const std::function<void()>& body) {
-    // Output is flushed first so that the child repeats none of it.
-    std::cout.flush();
+    // Output is flushed first so that the child repeats none of it (std::cout writes to stdio).
     std::fflush(nullptr);
     const pid_t pid = ::fork();
     if (pid < 0) return -1;

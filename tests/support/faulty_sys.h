@@ -31,7 +31,9 @@ class FaultySys : public catalogue::Sys {
 
     // The n-th call (counting from 1) of `kind` fails with `errnum` without taking effect, and
     // so do the `times` - 1 calls of that kind after it.
-    void failAt(SysCall kind, int n, int errnum, int times = 1);
+    void failAt(SysCall kind, int n, int errnum, int times = 1) {
+        planned_ = {kind, n, errnum, times};
+    }
     // The same, counting from now on.
     void failNext(SysCall kind, int n, int errnum, int times = 1) {
         failAt(kind, calls(kind) + n, errnum, times);
@@ -43,7 +45,7 @@ class FaultySys : public catalogue::Sys {
 
     int calls(SysCall kind) const { return counts_[static_cast<std::size_t>(kind)]; }
     // Whether the planned fault has happened, and on which file.
-    bool fired() const { return fired_; }
+    bool fired() const { return hit_.has_value(); }
     const std::optional<Hit>& hit() const { return hit_; }
 
     int open(const std::string& path, int flags, mode_t mode) override;
@@ -60,12 +62,11 @@ class FaultySys : public catalogue::Sys {
 
     std::array<int, kAllSysCalls.size()> counts_{};
     int steps_ = 0;
-    SysCall failKind_ = SysCall::Open;
-    int failAt_ = 0;
-    int failTimes_ = 1;
-    int failErrno_ = 0;
+    struct {
+        SysCall kind = SysCall::Open;
+        int at = 0, errnum = 0, times = 1;
+    } planned_;
     int killStep_ = 0;
-    bool fired_ = false;
     std::size_t writeCap_ = 0;
     std::optional<Hit> hit_;
     std::map<int, Hit> openFiles_;
