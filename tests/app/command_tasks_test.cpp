@@ -54,10 +54,7 @@ class Commands : public ::testing::Test {
   protected:
     void SetUp() override {
         folder.put("pemla.dat", "Rock\r\n");
-        folder.put("Rock.dat", entries(kRock));
-        folder.put("Rock.art", articles(kRock));
-        folder.put("Rock.arn", kRockArn);
-        folder.put("Rock.inf", " 1 \r\n");
+        folder.putList("Rock", entries(kRock), articles(kRock), kRockArn);
     }
     Outcome import(const std::string& list, const std::string& csv) {
         folder.put("in.csv", csv);

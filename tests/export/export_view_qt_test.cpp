@@ -29,13 +29,9 @@ TEST(ExportDialogOnQt, ExportsToAnyFolderAndSavesItOnTheCloseBox) {
     const std::string homeFolder = home.file("M\xC3\xBAsica");
     std::filesystem::create_directory(homeFolder);
     ::setenv("HOME", homeFolder.c_str(), 1);
-    folder.put("type.dat", "Types\r\nMusic CD\r\n");
-    folder.put("information.dat", "Information\r\nOriginal\r\n");
+    test_support::putMusicCatalogue(folder);
     folder.put("pemla.dat", "Canci\xF3nes\r\n");
-    folder.put("Canci\xC3\xB3nes.dat", data("movies.dat"));
-    folder.put("Canci\xC3\xB3nes.art", data("movies.art"));
-    folder.put("Canci\xC3\xB3nes.arn", "A#003\r\n");
-    folder.put("Canci\xC3\xB3nes.inf", " 1 \r\n");
+    folder.putList("Canci\xC3\xB3nes", data("movies.dat"), data("movies.art"), "A#003\r\n");
 
     ui::qt::QtPlatform platform;
     app::Program program(folder.path(), platform);
