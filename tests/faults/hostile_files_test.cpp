@@ -75,9 +75,8 @@ const Damage kDamages[] = {
     // The dialog opens on its defaults; the closing's save names the file and leaves it.
     {"AFifoForTheExportSettings", "export.dat", "[fifo]", true,
      [](Rig& r) {
-         r.platform.answer(Answer::Ok);
          r.open("Rock");
-         r.view.Command_export.click();
+         r.press(r.view.Command_export, {Answer::Ok});
          r.exportView.window.userClose();
      }},
     {"ADanglingLinkForTheEntryFile", "Rock.dat", "[link to no-such-file]", true},
