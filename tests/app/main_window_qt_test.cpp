@@ -17,7 +17,6 @@
 
 namespace {
 
-using qt_user::click;
 using qt_user::pick;
 
 // The program on a folder, its main window shown.
@@ -65,7 +64,7 @@ TEST(MainWindowOnQt, ASecondRealCopyEndsAndTheFirstStillAddsThroughItsWidgets) {
     w.view.Combo1->setCurrentIndex(0);
     w.view.Combo2->lineEdit()->selectAll();
     QTest::keyClicks(w.view.Combo2, QStringLiteral("2"));
-    click(w.view.Command_add);
+    qt_user::click(w.view.Command_add);
     EXPECT_EQ(folder.get("Music.art"), "Zebra#*\\Z001\r\nAbbey Road#*\\A001\r\n");
     EXPECT_EQ(folder.get("Music.dat"),
               "<|?Zebra\r\n<|'Music CD\r\n<||1\r\n<|*Original\r\n"

@@ -12,16 +12,13 @@
 namespace catalogue {
 namespace {
 
-using test_support::articleText;
-using test_support::crlf;
-using test_support::entryText;
+using namespace test_support;  // folders and the texts of the list files
 using Lines = std::vector<std::string>;
 using Articles = std::vector<std::pair<std::string, std::string>>;
 
-using test_support::kRock;
 const std::string kSkeletonDat(kSkeletonEntries), kSkeletonArt(kSkeletonArticles);
-const Lines& kRockArn = test_support::kRockCounter;
-const Articles& kRockArt = test_support::kRockArticles;
+const Lines& kRockArn = kRockCounter;
+const Articles& kRockArt = kRockArticles;
 
 class ListEdits : public ::testing::Test {
   protected:
@@ -42,13 +39,13 @@ class ListEdits : public ::testing::Test {
         EXPECT_EQ(folder.get(name + ".arn"), arn);
     }
     void expectRefused(const EditResult& result, Refused why, const std::string& words,
-                       const test_support::Files& before) const {
+                       const Files& before) const {
         EXPECT_EQ(result.refused, why);
         EXPECT_EQ(result.refusal, words);
-        EXPECT_EQ(test_support::snapshot(folder.path()), before);
+        EXPECT_EQ(snapshot(folder.path()), before);
     }
 
-    test_support::TempFolder folder;
+    TempFolder folder;
     Store store{folder.path()};
     std::string text_;
 };
@@ -113,7 +110,7 @@ TEST_F(ListEdits, AddRefusesWhatTheFilesCannotHoldOrTheListCannotTakeAndWritesNo
     for (const std::string title : {"ABC", "zebra", "XABC", "1ST"}) {
         cases.emplace_back(Entry{title, "CD", "1", ""}, Refused::DuplicateTitle, kDuplicateTitle);
     }
-    const test_support::Files before = test_support::snapshot(folder.path());
+    const Files before = snapshot(folder.path());
     for (const auto& [entry, why, words] : cases) {
         SCOPED_TRACE(entry.title + "|" + entry.type + "|" + entry.discs + "|" + entry.information);
         expectRefused(addEntry(store, read("Rock"), entry), why, words, before);
@@ -135,7 +132,7 @@ TEST_F(ListEdits, ALettersNumbersEndAt999) {
     const std::string usedUp =
         "Every article number of the letter A (A001 to A999) has been handed out in this list, "
         "so no other title that files under this letter can be stored in it.";
-    const test_support::Files before = test_support::snapshot(folder.path());
+    const Files before = snapshot(folder.path());
     expectRefused(addEntry(store, read("Full"), {"apple", "CD", "1", ""}), Refused::NumbersUsedUp,
                   usedUp, before);
     expectRefused(changeEntry(store, read("Full"), "Bass", {"Aqua", "CD", "1", ""}),
@@ -204,7 +201,7 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
     ASSERT_TRUE(changeEntry(store, read("Rock"), "Zebra", {"Zebra", "Vinyl", "4", ""}));
     EXPECT_FALSE(folder.has("Rock.art"));
     EXPECT_EQ(folder.get("Rock.arn"), crlf(kRockArn));
-    const test_support::Files before = test_support::snapshot(folder.path());
+    const Files before = snapshot(folder.path());
     EXPECT_THROW(changeEntry(store, read("Rock"), "Zebra", {"Zulu", "CD", "1", ""}),
                  CatalogueError);
     EXPECT_THROW(changeEntry(store, read("Rock"), "Gone", {"Gone", "CD", "1", ""}), CatalogueError);
@@ -218,12 +215,12 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
 // A change of one file is made durable by flushing the folder after its rename; a failed flush
 // is tried once more before it would be reported, as the change is made by then.
 TEST_F(ListEdits, AOneFileChangeFlushesTheFolderAfterItsRename) {
-    test_support::FaultySys sys;
+    FaultySys sys;
     Store flushed(folder.path(), sys);
-    sys.failAt(test_support::SysCall::Fsync, 2, EIO);
+    sys.failAt(SysCall::Fsync, 2, EIO);
     ASSERT_TRUE(changeEntry(flushed, read("Rock"), "Zebra", {"Zebra", "LP", "2", ""}));
     EXPECT_TRUE(sys.fired());
-    EXPECT_EQ(sys.calls(test_support::SysCall::Fsync), 3);
+    EXPECT_EQ(sys.calls(SysCall::Fsync), 3);
 }
 
 TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
@@ -261,7 +258,7 @@ TEST_F(ListEdits, AListNotReadWholeIsLeftUnchanged) {
     const std::string words =
         "The list \"Rock\" could not be read whole, so it is left unchanged. Open it again once "
         "its files are in order.";
-    const test_support::Files before = test_support::snapshot(folder.path());
+    const Files before = snapshot(folder.path());
     expectRefused(addEntry(store, partial, {"New", "CD", "1", ""}), Refused::NotReadWhole, words,
                   before);
     expectRefused(changeEntry(store, partial, "Zebra", {"Zebra", "CD", "1", ""}),
@@ -291,12 +288,12 @@ TEST_F(ListEdits, DeleteListRemovesItsFilesAndItsOwnIndexLine) {
     folder.remove(("abc.arn"));
     folder.remove(("abc.inf"));
     folder.put("pemla.dat", crlf(lists));
-    test_support::Files expected = test_support::snapshot(folder.path());
+    Files expected = snapshot(folder.path());
     expected.erase("abc.dat");
     expected.erase("abc.art");
     expected["pemla.dat"] = crlf({"xabc", "abcd", "Jazz"});
     deleteList(store, "abc", store.stampOf(kIndexFile), false, nullptr);
-    EXPECT_EQ(test_support::snapshot(folder.path()), expected);
+    EXPECT_EQ(snapshot(folder.path()), expected);
 }
 
 // The last list gives way to the placeholder list; the placeholder list itself, with an entry
@@ -307,15 +304,15 @@ TEST_F(ListEdits, DeletingTheOnlyListLeavesThePlaceholderList) {
         folder.remove(("Jazz" + std::string(ext)));
     }
     folder.put("pemla.dat", crlf({"Rock"}));
-    const test_support::Files expected = {{"pemla.dat", crlf({placeholder})},
-                                          {placeholder + ".dat", kSkeletonDat},
-                                          {placeholder + ".art", kSkeletonArt},
-                                          {placeholder + ".arn", "A#001\r\n"},
-                                          {placeholder + ".inf", " 1 \r\n"}};
+    const Files expected = {{"pemla.dat", crlf({placeholder})},
+                            {placeholder + ".dat", kSkeletonDat},
+                            {placeholder + ".art", kSkeletonArt},
+                            {placeholder + ".arn", "A#001\r\n"},
+                            {placeholder + ".inf", " 1 \r\n"}};
     for (const std::string& list : {std::string("Rock"), placeholder}) {
         SCOPED_TRACE(list);
         deleteList(store, list, store.stampOf(kIndexFile), true, nullptr);
-        EXPECT_EQ(test_support::snapshot(folder.path()), expected);
+        EXPECT_EQ(snapshot(folder.path()), expected);
         folder.putList(placeholder, kSkeletonDat + entryText({{"Mine", "CD", "1", ""}}),
                        kSkeletonArt, "A#002\r\n");
         folder.remove((placeholder + ".inf"));
@@ -331,14 +328,14 @@ TEST_F(ListEdits, CreateWritesTheIndexLineAndAnEmptyListOrRefusesTheName) {
         expectList(name, kSkeletonDat, kSkeletonArt, "A#001\r\n");
         EXPECT_EQ(folder.get(name + ".inf"), " " + std::to_string(flag) + " \r\n");
     }
-    const test_support::Files before = test_support::snapshot(folder.path());
+    const Files before = snapshot(folder.path());
     // Which names are taken is the list names' test; a refused one writes nothing.
     expectRefused(createList(store, "rock", 1), Refused::NameInUse, kNameInUse, before);
     expectRefused(createList(store, "a/b", 1), Refused::BadName, kBadName, before);
     Lines lists(kMaxEntries - 1, "L");
     folder.put("pemla.dat", crlf(lists));
     ASSERT_TRUE(createList(store, "One more", 1));
-    const test_support::Files full = test_support::snapshot(folder.path());
+    const Files full = snapshot(folder.path());
     expectRefused(createList(store, "Too many", 1), Refused::CatalogueFull, kCatalogueFull, full);
 }
 

@@ -21,9 +21,7 @@
 namespace catalogue {
 namespace {
 
-using test_support::FaultySys;
-using test_support::SysCall;
-using test_support::TempFolder;
+using namespace test_support;  // folders and failing system calls
 
 // Runs `f`, expecting a CatalogueError for `file` with the OS reason of `errnum`.
 template <typename F>

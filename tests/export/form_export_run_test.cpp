@@ -10,9 +10,6 @@
 
 namespace {
 
-using export_test::data;
-using ui::Answer;
-
 // "Movies" open with its flag, the dialog open on the output folder, no options set.
 struct OpenMovies : export_test::ExportFixture {
     explicit OpenMovies(const std::string& flag = " 0 \r\n") {
@@ -24,7 +21,7 @@ struct OpenMovies : export_test::ExportFixture {
     // Presses "Export", answering `boxes` boxes with OK; the boxes shown as "title style: text".
     std::vector<std::string> exportNow(int boxes = 1) {
         const std::size_t before = main.platform.shown().size();
-        for (int i = 0; i < boxes; ++i) main.platform.answer(Answer::Ok);
+        for (int i = 0; i < boxes; ++i) main.platform.answer(ui::Answer::Ok);
         EXPECT_TRUE(dialog.Command1.click());
         std::vector<std::string> shown;
         for (std::size_t i = before; i < main.platform.shown().size(); ++i) {
@@ -44,7 +41,7 @@ TEST(ExportRun, TextReportThenHtmlPageThenAReplacedReport) {
 
     EXPECT_EQ(f.exportNow(), std::vector<std::string>{"Done 64: Export done!"});
     const std::string text = f.out.get("Movies.TXT");
-    EXPECT_EQ(text, data("run_movies.txt"));
+    EXPECT_EQ(text, export_test::data("run_movies.txt"));
     EXPECT_EQ(f.dialog.Text1.text(), f.out.path() + "/");
     EXPECT_EQ(f.dialog.Check_noinfo.value(), 1);  // the list's flag 0 wins over the user's box
 

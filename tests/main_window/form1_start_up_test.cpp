@@ -81,7 +81,7 @@ TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) 
     for (const std::string file :
          {"type.dat", "information.dat", "pemla.dat", "type.dat ", "information.dat "}) {
         SCOPED_TRACE(file);
-        test_support::MainWindowFixture fresh;
+        MainWindowFixture fresh;
         const std::string name = file.substr(0, file.find(' '));
         file.ends_with(' ') ? fresh.folder.put(name, "") : fresh.folder.remove(name);
         fresh.platform.answer(Answer::Ok);
@@ -102,7 +102,7 @@ TEST_F(Form1Test, ASecondCopyNamesTheFolderAndEndsWithStatusThreeTouchingNothing
     folder.put("pemla.journal", "the first copy's commit, under way");
     const Files before = files();
     ui::memory::MemoryPlatform other;
-    test_support::MemoryForm1 otherView;
+    MemoryForm1 otherView;
     main_window::Form1 second(otherView.controls(), other, store);
     other.answer(Answer::Ok);
     otherView.window.show();

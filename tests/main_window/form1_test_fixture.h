@@ -12,12 +12,7 @@
 namespace main_window_test {
 
 using Strings = std::vector<std::string>;
-using test_support::articleText;
-using test_support::crlf;
-using test_support::entryText;
-using test_support::Files;
-using test_support::kRock;
-using test_support::putRock;
+using namespace test_support;  // the window tests speak of the catalogue folder's files
 using ui::Answer;
 
 class Form1Test : public ::testing::Test, public test_support::MainWindowFixture {

@@ -13,7 +13,6 @@
 
 namespace {
 
-using ui::Answer;
 using namespace ui::memory;
 
 const std::string kNotFound = "Can't found that article number!";
@@ -105,7 +104,7 @@ TEST(SearchDialog, SearchesTheTextReadAtOpeningAsOftenAsAsked) {
     std::size_t boxes = 0;
     for (const auto& [number, title] : steps) {
         SCOPED_TRACE("number \"" + number + "\"");
-        if (!title) d.f.platform.answer(Answer::Ok);
+        if (!title) d.f.platform.answer(ui::Answer::Ok);
         d.search(number);
         shown = title.value_or(shown);
         EXPECT_EQ(d.Text2.text(), shown);
