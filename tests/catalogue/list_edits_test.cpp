@@ -17,6 +17,7 @@ using Lines = std::vector<std::string>;
 using Articles = std::vector<std::pair<std::string, std::string>>;
 
 const std::string kSkeletonDat(kSkeletonEntries), kSkeletonArt(kSkeletonArticles);
+const std::string kMarks = ": the list's files use it to mark their records.";
 const Lines& kRockArn = kRockCounter;
 const Articles& kRockArt = kRockArticles;
 
@@ -83,21 +84,20 @@ TEST_F(ListEdits, AddAppendsTheEntryAndTheNextNumberOfItsFirstLetter) {
 }
 
 TEST_F(ListEdits, AddRefusesWhatTheFilesCannotHoldOrTheListCannotTakeAndWritesNothing) {
-    const std::string marks = ": the list's files use it to mark their records.";
     std::vector<std::tuple<Entry, Refused, std::string>> cases = {
         {{"", "CD", "1", "Copy"}, Refused::BadEntry, "Please type a title first."},
         {{"Dots#*\\here", "CD", "1", "Copy"},
          Refused::BadEntry,
-         "The title cannot hold \"#*\\\"" + marks},
+         "The title cannot hold \"#*\\\"" + kMarks},
         {{"Line\nbreak", "CD", "1", "Copy"},
          Refused::BadEntry,
-         "The title cannot hold a line break" + marks},
+         "The title cannot hold a line break" + kMarks},
         {{"Title", "CD", "1", "a\rb"},
          Refused::BadEntry,
-         "The information cannot hold a line break" + marks},
+         "The information cannot hold a line break" + kMarks},
     };
     for (const std::string tag : {"<|?", "<|'", "<||", "<|*"}) {
-        const std::string holds = " cannot hold \"" + tag + "\"" + marks;
+        const std::string holds = " cannot hold \"" + tag + "\"" + kMarks;
         cases.emplace_back(Entry{"a" + tag + "b", "CD", "1", ""}, Refused::BadEntry,
                            "The title" + holds);
         cases.emplace_back(Entry{"T", "a" + tag, "1", ""}, Refused::BadEntry, "The type" + holds);
@@ -206,10 +206,7 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
                  CatalogueError);
     EXPECT_THROW(changeEntry(store, read("Rock"), "Gone", {"Gone", "CD", "1", ""}), CatalogueError);
     expectRefused(changeEntry(store, read("Rock"), "Zebra", {"Ze\nbra", "CD", "1", ""}),
-                  Refused::BadEntry,
-                  "The title cannot hold a line break: the list's files use it to mark their "
-                  "records.",
-                  before);
+                  Refused::BadEntry, "The title cannot hold a line break" + kMarks, before);
 }
 
 // A change of one file is made durable by flushing the folder after its rename; a failed flush
