@@ -63,11 +63,9 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     const char* added[][4] = {{"Am\xe9lie", "DVD video", "1", "Original"},
                               {"Brazil", "Blu-ray video", "2", "Copy"},
                               {"Casablanca", "DVD video", "1", "Boxed"}};
+    QWidget* const fields[] = {main.Text1, main.Combo1, main.Combo2, main.Combo3};
     for (const auto& entry : added) {
-        retype(main.Text1, entry[0]);
-        retype(main.Combo1, entry[1]);
-        retype(main.Combo2, entry[2]);
-        retype(main.Combo3, entry[3]);
+        for (int i = 0; i < 4; ++i) retype(fields[i], entry[i]);
         click(main.Command_add);
     }
     ASSERT_EQ(main.List1->count(), 4);
