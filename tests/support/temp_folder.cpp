@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
+#include <set>
 #include <sstream>
 #include <vector>
 
@@ -63,11 +64,10 @@ void TempFolder::remove(std::string_view name) const {
 }
 
 std::string TempFolder::listing() const {
-    std::vector<std::string> names;
+    std::set<std::string> names;
     for (const auto& item : std::filesystem::directory_iterator(path_)) {
-        names.push_back(item.path().filename().string());
+        names.insert(item.path().filename().string());
     }
-    std::sort(names.begin(), names.end());
     std::string out;
     for (const auto& name : names) out += name + "\n";
     return out;
