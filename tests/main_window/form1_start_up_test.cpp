@@ -77,19 +77,22 @@ TEST_F(Form1Test, DialogsOpenOnlyOnceAListIsSelectedAndOpen) {
 }
 
 TEST(Form1StartUp, AMissingOrEmptyFileIsNamedWithItsFolderAndEndsWithStatusOne) {
-    // Each file missing, then (where the name ends with a space) there but empty.
-    for (const std::string file :
-         {"type.dat", "information.dat", "pemla.dat", "type.dat ", "information.dat "}) {
-        SCOPED_TRACE(file);
-        MainWindowFixture fresh;
-        const std::string name = file.substr(0, file.find(' '));
-        file.ends_with(' ') ? fresh.folder.put(name, "") : fresh.folder.remove(name);
+    const std::pair<const char*, bool> cases[] = {{"type.dat", true},
+                                                  {"information.dat", true},
+                                                  {"pemla.dat", true},
+                                                  {"type.dat", false},
+                                                  {"information.dat", false}};
+    for (const auto& [name, missing] : cases) {
+        SCOPED_TRACE(std::string(name) + (missing ? " missing" : " empty"));
+        test_support::MainWindowFixture fresh;
+        missing ? fresh.folder.remove(name) : fresh.folder.put(name, "");
         fresh.platform.answer(Answer::Ok);
         fresh.start();
         ASSERT_EQ(fresh.platform.shown().size(), 1u);
         const auto& box = fresh.platform.shown().front();
         EXPECT_EQ(box.style, 16);
-        EXPECT_NE(box.prompt.find("\"" + name + "\""), std::string::npos) << box.prompt;
+        EXPECT_NE(box.prompt.find("\"" + std::string(name) + "\""), std::string::npos)
+            << box.prompt;
         EXPECT_NE(box.prompt.find(fresh.folder.path()), std::string::npos) << box.prompt;
         EXPECT_EQ(fresh.platform.ended, 1);
     }
