@@ -11,8 +11,10 @@ namespace test_support {
 
 // The new-list dialog's controls in memory, each owned by the dialog's window.
 struct MemoryNewList {
-    MemoryNewList();
-    new_list::Form_new_listControls controls();
+    MemoryNewList() { ui::memory::own(window, Text1, Check_info, Command1, Command2); }
+    new_list::Form_new_listControls controls() {
+        return {window, Label1, Text1, Check_info, Command1, Command2};
+    }
 
     ui::memory::MemoryWindow window;
     ui::memory::MemoryLabel Label1;
@@ -25,8 +27,15 @@ struct MemoryNewList {
 // The export dialog's controls in memory, each owned by the dialog's window; "/" is the only
 // volume until the test offers others.
 struct MemoryFormExport {
-    MemoryFormExport();
-    exporting::Form_ExportControls controls();
+    MemoryFormExport() {
+        ui::memory::own(window, Dir1, Drive1, Command1, Command2, Checkart, Checkhtml, Checkcounter,
+                        Checkdate, Checkline, Check_lastadd, Text2, Combo1, Check_noinfo, Text1);
+    }
+    exporting::Form_ExportControls controls() {
+        return {window,   Label1,    Dir1,         Drive1,    Command1,     Command2,
+                Checkart, Checkhtml, Checkcounter, Checkdate, Checkline,    Check_lastadd,
+                Label2,   Text2,     Label3,       Combo1,    Check_noinfo, Text1};
+    }
 
     ui::memory::MemoryWindow window;
     ui::memory::MemoryLabel Label1;

@@ -4,19 +4,6 @@
 
 namespace test_support {
 
-MemoryForm1::MemoryForm1() {
-    ui::memory::own(window, List_list, Command_create, Command_delete, List1, Command_search,
-                    Command_delentry, Command_export, Command_print, Text1, Combo1, Combo2, Combo3,
-                    Textart, Command_add, Command_change, Command_clear);
-}
-
-main_window::Form1Controls MemoryForm1::controls() {
-    return {window,      Label1,         List_list,        Command_create, Command_delete, Label2,
-            List1,       Command_search, Command_delentry, Command_export, Command_print,  Label4,
-            Text1,       Combo1,         Combo2,           Combo3,         Label3,         Textart,
-            Command_add, Command_change, Command_clear};
-}
-
 MainWindowFixture::MainWindowFixture()
     : store(folder.path(), sys),
       form(std::make_unique<main_window::Form1>(view.controls(), platform, store)),

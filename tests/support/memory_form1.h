@@ -18,8 +18,18 @@ namespace test_support {
 // The main window's controls in memory, each owned by the window so that a disabled window
 // refuses input.
 struct MemoryForm1 {
-    MemoryForm1();
-    main_window::Form1Controls controls();
+    MemoryForm1() {
+        ui::memory::own(window, List_list, Command_create, Command_delete, List1, Command_search,
+                        Command_delentry, Command_export, Command_print, Text1, Combo1, Combo2,
+                        Combo3, Textart, Command_add, Command_change, Command_clear);
+    }
+    main_window::Form1Controls controls() {
+        return {window,        Label1, List_list,      Command_create,   Command_delete,
+                Label2,        List1,  Command_search, Command_delentry, Command_export,
+                Command_print, Label4, Text1,          Combo1,           Combo2,
+                Combo3,        Label3, Textart,        Command_add,      Command_change,
+                Command_clear};
+    }
 
     ui::memory::MemoryWindow window;
     ui::memory::MemoryLabel Label1;
