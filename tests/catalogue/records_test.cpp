@@ -24,11 +24,7 @@ const Entry kStar{"Star", "CD", "1", "first"};
 const Entry kStarWars{"Star Wars", "DVD", "2", "second"};
 const Entry kWars{"Wars", "LP", "3", ""};
 
-std::string entriesOf(const std::vector<Entry>& entries) {
-    std::string text;
-    for (const Entry& e : entries) text += entryLines(e);
-    return text;
-}
+using test_support::entryText;
 
 // An entry found, as its four lines, or "none".
 std::string found(std::string_view text, std::string_view title) {
@@ -40,13 +36,13 @@ TEST(Records, FindEntryByTitleInAnyFileOrder) {
     std::vector<Entry> all = {kStar, kStarWars, kWars};
     const auto byTitle = [](auto& a, auto& b) { return a.title < b.title; };
     do {
-        const std::string text = entriesOf(all);
+        const std::string text = entryText(all);
         for (const Entry& e : all) EXPECT_EQ(found(text, e.title), entryLines(e)) << text;
         EXPECT_EQ(found(text, "Sta"), "none");
         EXPECT_EQ(found(text, "ar Wars"), "none");
     } while (std::next_permutation(all.begin(), all.end(), byTitle));
 
-    const std::string text = entriesOf({kStar, {"\xC9t\xE9", "CD", "1", "x"}});
+    const std::string text = entryText({kStar, {"\xC9t\xE9", "CD", "1", "x"}});
     EXPECT_EQ(found(text, "STAR"), entryLines(kStar));  // the stored title comes back
     EXPECT_EQ(findEntry(text, "\xE9T\xC9")->title, "\xC9t\xE9");
     // The markers after the title line compare exactly: the entry's own fields, in order.
@@ -55,15 +51,15 @@ TEST(Records, FindEntryByTitleInAnyFileOrder) {
     // With two titles equal but for case, the first in file order is the one changed or removed;
     // how the others stay around it is the list edits' test.
     const Entry upper{"STAR", "x", "y", "z"};
-    EXPECT_EQ(removeEntry(entriesOf({kWars, kStar, upper}), "star"), entriesOf({kWars, upper}));
-    EXPECT_EQ(replaceEntry(entriesOf({kStar, upper}), "STAR", kWars), entriesOf({kWars, upper}));
+    EXPECT_EQ(removeEntry(entryText({kWars, kStar, upper}), "star"), entryText({kWars, upper}));
+    EXPECT_EQ(replaceEntry(entryText({kStar, upper}), "STAR", kWars), entryText({kWars, upper}));
 }
 
 // A text whose last line lacks its CR LF gets it before the new lines.
 TEST(Records, AppendEndsAnUnendedLastLineFirst) {
     EXPECT_EQ(appendEntry("", kStar), entryLines(kStar));
     EXPECT_EQ(appendEntry("<|?Star\r\n<|'CD\r\n<||1\r\n<|*first", kWars),
-              entriesOf({kStar, kWars}));
+              entryText({kStar, kWars}));
 }
 
 // Older files could store the title tag inside a value. Only a line that starts one of the
@@ -73,16 +69,16 @@ TEST(Records, TitleTagsInsideValuesAreNoEntries) {
     const Entry a{"A", "<|?B", "1", "see <|?B"};
     const Entry b{"B", "CD", "2", "b"};
     const Entry c{"C", "LP", "3", "<|?C"};
-    const std::string text = entriesOf({a, b, c});
+    const std::string text = entryText({a, b, c});
     EXPECT_EQ(found(text, "b"), entryLines(b));
     EXPECT_EQ(found(text, "C"), entryLines(c));
-    EXPECT_EQ(findTitleLine(entriesOf({a}), "B"), std::string::npos);
-    EXPECT_EQ(findTitleLine(text, "C"), entriesOf({a, b}).size());
+    EXPECT_EQ(findTitleLine(entryText({a}), "B"), std::string::npos);
+    EXPECT_EQ(findTitleLine(text, "C"), entryText({a, b}).size());
     const Entry changed{"N", "x", "y", "z"};
-    EXPECT_EQ(replaceEntry(text, "A", changed), entriesOf({changed, b, c}));
-    EXPECT_EQ(replaceEntry(text, "B", changed), entriesOf({a, changed, c}));
-    EXPECT_EQ(removeEntry(text, "A"), entriesOf({b, c}));
-    EXPECT_EQ(removeEntry(text, "C"), entriesOf({a, b}));
+    EXPECT_EQ(replaceEntry(text, "A", changed), entryText({changed, b, c}));
+    EXPECT_EQ(replaceEntry(text, "B", changed), entryText({a, changed, c}));
+    EXPECT_EQ(removeEntry(text, "A"), entryText({b, c}));
+    EXPECT_EQ(removeEntry(text, "C"), entryText({a, b}));
     EntrySpan span;
     ASSERT_TRUE(removeEntry(text, "A", &span));
     EXPECT_TRUE(span.oneEntry);
