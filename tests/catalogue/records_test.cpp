@@ -133,17 +133,12 @@ TEST(ArticleNumbers, LetterOfTheFirstCharacter) {
 // ends with the counter text they leave.
 TEST(ArticleNumbers, NumbersAndCounterTextsByteForByte) {
     struct Case {
-        std::string counter;
-        std::string firsts;
-        std::string numbers;
-        std::string after;
+        std::string counter, firsts, numbers, after;
     };
     const Case cases[] = {
         // The worked example; é files under "!".
-        {std::string(kSkeletonCounter),
-         "AB2a\xE9"
-         "b",
-         "A001 B001 !001 A002 !002 B002 ", "A#003\r\nB#003\r\n!#003\r\n"},
+        {std::string(kSkeletonCounter), "AB2a\351b", "A001 B001 !001 A002 !002 B002 ",
+         "A#003\r\nB#003\r\n!#003\r\n"},
         {std::string(kSkeletonCounter), "CcC", "C001 C002 C003 ", "A#001\r\nC#004\r\n"},
         {"A#005\r\n\r\nB#003\r\n\r\n", "BQ", "B003 Q001 ", "A#005\r\n\r\nB#004\r\n\r\nQ#002\r\n"},
         {"", "K", "K001 ", "K#002\r\n"},

@@ -34,8 +34,7 @@ void expectFolder(const std::string& folder, const std::string& expectedFolder,
 }
 
 TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
-    test_support::TempFolder work;
-    test_support::TempFolder home;
+    test_support::TempFolder work, home;
     ::setenv("HOME", home.path().c_str(), 1);  // the export dialog's first output folder
     const std::string reports = home.file("reports");
     fs::create_directory(reports);

@@ -22,9 +22,7 @@ namespace {
 using export_test::data;
 
 TEST(ExportDialogOnQt, ExportsToAnyFolderAndSavesItOnTheCloseBox) {
-    test_support::TempFolder folder;
-    test_support::TempFolder home;
-    test_support::TempFolder out;
+    test_support::TempFolder folder, home, out;
     // A localized home folder, and a list whose Latin-1 name has its files under UTF-8 names.
     const std::string homeFolder = home.file("M\xC3\xBAsica");
     std::filesystem::create_directory(homeFolder);

@@ -122,12 +122,7 @@ TEST_F(Form1Test, TitlesEqualApartFromCaseShowTheFirstAndCombosLimitOnlyTyping) 
 // Find as you type in the title list.
 TEST_F(Form1Test, FindSelectsMatchingTitlesInTurnAndNeverHidesOne) {
     // List1 order: Abba Gold, abba live, Blur, Crème Brûlée, CRÈME fraîche, Zappa.
-    const std::string creme =
-        "Cr\xE8me Br\xFBl\xE9"
-        "e";
-    const std::string fraiche =
-        "CR\xC8ME fra\xEE"
-        "che";
+    const std::string creme = "Cr\350me Br\373l\351e", fraiche = "CR\310ME fra\356che";
     std::string mix;
     for (const char* title :
          {"Zappa", "abba live", creme.c_str(), "Blur", fraiche.c_str(), "Abba Gold"}) {

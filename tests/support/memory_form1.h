@@ -94,8 +94,7 @@ struct MainWindowFixture {
     void expectBox(std::size_t before, int style, const std::string& title,
                    const std::string& prompt = {}) const;
 
-    TempFolder folder;
-    TempFolder out;
+    TempFolder folder, out;
     FaultySys sys;
     catalogue::Store store;
     ui::memory::MemoryPlatform platform;

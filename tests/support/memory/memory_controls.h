@@ -173,8 +173,7 @@ class MemoryDirList : public Control<DirList> {
 // A message box as shown. Thrown when shown under the busy pointer, or when the test did not
 // script it: deliberately no std::exception, so that no handler guard can swallow it.
 struct MessageBox {
-    std::string prompt;
-    std::string title;
+    std::string prompt, title;
     int style;
 };
 struct MessageBoxWhileBusy : MessageBox {};
