@@ -6,7 +6,7 @@
 #include <QKeySequence>
 #include <QLabel>
 #include <QLineEdit>
-#include <QListWidget>
+#include <QListView>
 #include <QPainter>
 #include <QPushButton>
 #include <QShortcut>
@@ -107,11 +107,11 @@ struct MainWindowView::Adapters {
 MainWindowView::MainWindowView() : window_(std::make_unique<Backdrop>()) {
     QWidget* w = window_.get();
     Label1 = caption(w);
-    List_list = new QListWidget(w);
+    List_list = new QListView(w);
     Command_create = new QPushButton(w);
     Command_delete = new QPushButton(w);
     Label2 = caption(w);
-    List1 = new QListWidget(w);
+    List1 = new QListView(w);
     Command_search = new QPushButton(w);
     Command_delentry = new QPushButton(w);
     Command_export = new QPushButton(w);

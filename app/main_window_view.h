@@ -11,7 +11,7 @@ class QComboBox;
 class QHBoxLayout;
 class QLabel;
 class QLineEdit;
-class QListWidget;
+class QListView;
 class QPushButton;
 
 namespace app {
@@ -28,8 +28,8 @@ class MainWindowView {
     void connectFinder(main_window::TitleFinder& finder);
     QWidget* widget() const { return window_.get(); }
 
-    QListWidget* List_list;
-    QListWidget* List1;
+    QListView* List_list;
+    QListView* List1;
     QLineEdit* Text1;
     QLineEdit* Textart;
     QComboBox* Combo1;

@@ -20,7 +20,7 @@ void BM_FindKeystroke(benchmark::State& state) {
     World& w = World::get(static_cast<int>(state.range(0)));
     w.form->LoadEntries(w.list);
     main_window::TitleFinder finder(*w.form);
-    const std::string last = w.view.List1.itemText(w.view.List1.count() - 1);
+    const std::string last(w.view.List1.itemText(w.view.List1.count() - 1));
     for (auto _ : state) finder.Text_find_Change(last);
     if (w.view.Text1.text() != last) state.SkipWithError("the last title was not found");
 }

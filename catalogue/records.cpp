@@ -70,19 +70,26 @@ std::string flagFile(std::string_view list) {
     return fileSystemName(list) + ".inf";
 }
 
-std::optional<std::vector<std::string>> entryTitles(std::string_view bytes) {
-    std::vector<std::string> titles;
-    titles.reserve(bytes.size() / 64 + 1);  // entries of a real list take some 60 bytes or more
+std::optional<list_order::Items> entryTitles(std::string_view bytes) {
+    // The titles go into one buffer, not one string each: a long list opens that much faster.
+    std::string titles;
+    titles.reserve(bytes.size() / 3);  // the title is mostly the longest of an entry's lines
+    std::vector<list_order::Items::Place> places;
+    places.reserve(bytes.size() / 64 + 1);  // entries of a real list take some 60 bytes or more
+    // Lines as lineAt() splits them, with their ends found sixteen bytes at a time.
     std::size_t lines = 0;
     for (std::size_t at = 0; at < bytes.size(); ++lines) {
-        const Line line = lineAt(bytes, at);
+        const std::size_t cr = findAnyOf<'\r'>(bytes, at);
         if (lines % 4 == 0) {
-            titles.emplace_back(line.text.size() > 3 ? line.text.substr(3) : std::string_view());
+            const std::size_t from = std::min(at + 3, cr);
+            places.push_back({titles.size(), cr - from});
+            titles.append(bytes, from, cr - from);
         }
-        at = line.next;
+        at = cr + 1;
+        if (at < bytes.size() && bytes[at] == '\n') ++at;
     }
     if (lines % 4 != 0) return std::nullopt;
-    return titles;
+    return list_order::Items(std::move(titles), std::move(places));
 }
 
 std::size_t findTitleLine(std::string_view entries, std::string_view title) {

@@ -6,6 +6,8 @@
 #include <string_view>
 #include <vector>
 
+#include "list_order/list_order.h"
+
 // Record formats of the list files and the lookups and edits made on their file texts.
 // An entry is four lines: "<|?" title, "<|'" type, "<||" discs, "<|*" information.
 // An article line is title + "#*\" + a four-character article number.
@@ -40,9 +42,9 @@ std::string articleFile(std::string_view list);
 std::string counterFile(std::string_view list);
 std::string flagFile(std::string_view list);
 
-// The titles of an entry file's bytes, in file order: each entry's first line from its fourth
-// character on. Nothing when the file does not hold whole entries of four lines.
-std::optional<std::vector<std::string>> entryTitles(std::string_view bytes);
+// The titles of an entry file's bytes in the list boxes' order: each entry's first line from its
+// fourth character on. Nothing when the file does not hold whole entries of four lines.
+std::optional<list_order::Items> entryTitles(std::string_view bytes);
 
 // Position of the first title line "<|?" + title + CR in an entry text, ignoring case, that
 // starts one of its four-line entries; npos if none.

@@ -14,11 +14,10 @@
 
 namespace exporting {
 
-std::vector<std::string> listTitles(catalogue::Store& store, const std::string& list) {
+list_order::Items listTitles(catalogue::Store& store, const std::string& list) {
     const std::string file = catalogue::entryFile(list);
-    std::optional<std::vector<std::string>> titles = catalogue::entryTitles(store.readBytes(file));
+    std::optional<list_order::Items> titles = catalogue::entryTitles(store.readBytes(file));
     if (!titles) throw catalogue::CatalogueError(file, "the file ends inside an entry");
-    catalogue::sortItems(*titles);
     return std::move(*titles);
 }
 
@@ -80,7 +79,7 @@ std::string reportFileBytes(const std::string& list, std::string report, bool ht
 }
 
 std::string listCsv(catalogue::Store& store, const std::string& list) {
-    const std::vector<std::string> titles = listTitles(store, list);
+    const list_order::Items titles = listTitles(store, list);
     const std::string entryText = store.readText(catalogue::entryFile(list));
     const std::string articleText = store.readText(catalogue::articleFile(list));
     const EntryIndex entries(entryText);
@@ -88,10 +87,11 @@ std::string listCsv(catalogue::Store& store, const std::string& list) {
     std::string csv =
         catalogue::csvRow({"title", "type", "discs", "information", "article number"});
     csv.reserve(entryText.size() + articleText.size());
-    for (const std::string& title : titles) {
+    for (std::size_t i = 0; i < titles.size(); ++i) {
+        const std::string_view title = titles[i];
         const Fields fields = entries.find(title);
         csv += catalogue::latin1ToUtf8(catalogue::csvRow(
-            {title, std::string(fields.type), std::string(fields.discs),
+            {std::string(title), std::string(fields.type), std::string(fields.discs),
              std::string(fields.information), std::string(articles.find(title))}));
     }
     return csv;

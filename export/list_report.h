@@ -33,7 +33,7 @@ struct ListReport {
 
 // The titles of a list in the order the main window shows them. Throws CatalogueError when the
 // entry file cannot be read or does not hold whole entries.
-std::vector<std::string> listTitles(catalogue::Store& store, const std::string& list);
+list_order::Items listTitles(catalogue::Store& store, const std::string& list);
 
 // The report of `list` over `titles`: the table, the list's optional top text, the last-added
 // section as asked (left out when it asks for more rows than there are titles) and the credit

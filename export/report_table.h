@@ -4,6 +4,8 @@
 #include <string_view>
 #include <vector>
 
+#include "list_order/list_order.h"
+
 // The report table of an export: every title of the open list as one row of a table drawn in
 // ASCII characters, 78 characters wide, under a top border carrying the list's name.
 namespace exporting {
@@ -26,15 +28,19 @@ class TitleList {
         : strings_(titles.data()), size_(titles.size()) {}
     TitleList(const std::vector<std::string_view>& titles)  // NOLINT
         : views_(titles.data()), size_(titles.size()) {}
+    TitleList(const list_order::Items& titles)  // NOLINT
+        : items_(&titles), size_(titles.size()) {}
 
     std::size_t size() const { return size_; }
     std::string_view operator[](std::size_t i) const {
-        return strings_ != nullptr ? std::string_view(strings_[i]) : views_[i];
+        if (strings_ != nullptr) return strings_[i];
+        return views_ != nullptr ? views_[i] : (*items_)[i];
     }
 
   private:
     const std::string* strings_ = nullptr;
     const std::string_view* views_ = nullptr;
+    const list_order::Items* items_ = nullptr;
     std::size_t size_ = 0;
 };
 

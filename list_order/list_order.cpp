@@ -6,6 +6,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
+#include <stdexcept>
 
 namespace list_order {
 
@@ -43,20 +44,24 @@ std::uint64_t headPart(std::string_view text, std::size_t from) {
 
 }  // namespace
 
-void sortItems(std::vector<std::string>& items) {
-    // Every item folded once into one buffer; the sort then compares plain bytes, and mostly
-    // only the first sixteen of them, held next to the item's number.
+namespace {
+
+// The indexes 0 to `count` - 1 in the order of the texts `text(i)` gives.
+template <class TextAt>
+std::vector<std::size_t> orderOf(std::size_t count, TextAt text) {
+    // Every text folded once into one buffer; the sort then compares plain bytes, and mostly
+    // only the first sixteen of them, held next to the text's number.
     std::size_t total = 0;
-    for (const auto& item : items) total += item.size();
+    for (std::size_t i = 0; i < count; ++i) total += text(i).size();
     std::string folded(total + 16, '\0');  // sixteen bytes spare: each head is read whole
-    std::vector<std::size_t> starts(items.size() + 1);
+    std::vector<std::size_t> starts(count + 1);
     char* to = folded.data();
-    for (std::size_t i = 0; i < items.size(); ++i) {
+    for (std::size_t i = 0; i < count; ++i) {
         starts[i] = static_cast<std::size_t>(to - folded.data());
-        for (const char c : items[i])
+        for (const char c : text(i))
             *to++ = static_cast<char>(kFoldTable[static_cast<unsigned char>(c)]);
     }
-    starts[items.size()] = total;
+    starts[count] = total;
     const auto key = [&](std::size_t i) {
         return std::string_view(folded).substr(starts[i], starts[i + 1] - starts[i]);
     };
@@ -65,24 +70,129 @@ void sortItems(std::vector<std::string>& items) {
         std::uint64_t high, low;
         std::size_t item;
     };
-    std::vector<Head> heads(items.size());
-    for (std::size_t i = 0; i < items.size(); ++i) {
+    std::vector<Head> heads(count);
+    for (std::size_t i = 0; i < count; ++i) {
         const std::string_view k = key(i);
         heads[i] = {headPart(k, 0), headPart(k, 8), i};
     }
-    // Heads that differ order the items as their folded texts do (unsigned bytes, a shorter
-    // prefix first); equal heads leave it to the whole texts, then to the items themselves.
-    std::sort(heads.begin(), heads.end(), [&](const Head& a, const Head& b) {
+    // Heads that differ order the texts as their folded texts do (unsigned bytes, a shorter
+    // prefix first); equal heads leave it to the whole texts, then to the texts themselves.
+    const auto less = [&](const Head& a, const Head& b) {
         if (a.high != b.high) return a.high < b.high;
         if (a.low != b.low) return a.low < b.low;
         const int byFold = key(a.item).compare(key(b.item));
         if (byFold != 0) return byFold < 0;
-        return items[a.item] < items[b.item];
-    });
+        return text(a.item) < text(b.item);
+    };
+    // The first eight bytes are sorted by their digits, eleven bits at a time and without a
+    // single comparison; only the runs that share them are then sorted by comparing.
+    std::vector<Head> spare(count);
+    constexpr int kBits = 11;
+    for (int shift = 0; shift < 64; shift += kBits) {
+        std::array<std::size_t, (1 << kBits) + 1> starts{};
+        const auto digit = [shift](const Head& h) {
+            return static_cast<std::size_t>(h.high >> shift) & ((1u << kBits) - 1);
+        };
+        for (const Head& h : heads) ++starts[digit(h) + 1];
+        if (std::find(starts.begin(), starts.end(), count) != starts.end()) continue;  // one digit
+        for (std::size_t d = 1; d < starts.size(); ++d) starts[d] += starts[d - 1];
+        for (const Head& h : heads) spare[starts[digit(h)]++] = h;
+        heads.swap(spare);
+    }
+    for (auto run = heads.begin(); run != heads.end();) {
+        const auto end =
+            std::find_if(run + 1, heads.end(), [&](const Head& h) { return h.high != run->high; });
+        if (end - run > 1) std::sort(run, end, less);
+        run = end;
+    }
+    std::vector<std::size_t> order(count);
+    for (std::size_t i = 0; i < count; ++i) order[i] = heads[i].item;
+    return order;
+}
+
+}  // namespace
+
+void sortItems(std::vector<std::string>& items) {
+    const std::vector<std::size_t> order =
+        orderOf(items.size(), [&](std::size_t i) { return std::string_view(items[i]); });
     std::vector<std::string> sorted;
     sorted.reserve(items.size());
-    for (const Head& h : heads) sorted.push_back(std::move(items[h.item]));
+    for (const std::size_t i : order) sorted.push_back(std::move(items[i]));
     items = std::move(sorted);
+}
+
+Items::Items(const std::vector<std::string>& texts) {
+    places_.reserve(texts.size());
+    for (const std::string& text : texts) {
+        places_.push_back({bytes_.size(), text.size()});
+        bytes_ += text;
+    }
+    *this = Items(std::move(bytes_), std::move(places_));
+}
+
+Items::Items(std::string bytes, std::vector<Place> places) : bytes_(std::move(bytes)) {
+    const std::vector<std::size_t> order = orderOf(places.size(), [&](std::size_t i) {
+        return std::string_view(bytes_).substr(places[i].at, places[i].size);
+    });
+    places_.reserve(places.size());
+    for (const std::size_t i : order) places_.push_back(places[i]);
+}
+
+std::string_view Items::at(std::size_t i) const {
+    if (i >= places_.size()) throw std::out_of_range("list item");
+    return (*this)[i];
+}
+
+std::size_t Items::placeFor(std::string_view text) const {
+    const auto place = std::upper_bound(places_.begin(), places_.end(), text,
+                                        [&](std::string_view t, const Place& p) {
+                                            return itemLess(t, {bytes_.data() + p.at, p.size});
+                                        });
+    return static_cast<std::size_t>(place - places_.begin());
+}
+
+std::size_t Items::find(std::string_view text) const {
+    const auto place = std::lower_bound(places_.begin(), places_.end(), text,
+                                        [&](const Place& p, std::string_view t) {
+                                            return itemLess({bytes_.data() + p.at, p.size}, t);
+                                        });
+    const std::size_t index = static_cast<std::size_t>(place - places_.begin());
+    return index < size() && (*this)[index] == text ? index : npos;
+}
+
+std::size_t Items::insert(std::string_view text) {
+    const std::size_t index = placeFor(text);
+    const Place added{bytes_.size(), text.size()};
+    bytes_.append(text);  // may be one of these very texts: append copies before it frees
+    places_.insert(places_.begin() + static_cast<std::ptrdiff_t>(index), added);
+    return index;
+}
+
+std::size_t Items::remove(std::string_view text) {
+    const std::size_t index = find(text);
+    if (index == npos) return npos;
+    const auto place = places_.begin() + static_cast<std::ptrdiff_t>(index);
+    unused_ += place->size;
+    places_.erase(place);
+    // Texts taken out leave their bytes behind; once they are most of the buffer, it is packed.
+    if (unused_ > 4096 && unused_ > bytes_.size() / 2) {
+        std::string packed;
+        packed.reserve(bytes_.size() - unused_);
+        for (Place& p : places_) {
+            packed.append(bytes_, p.at, p.size);
+            p.at = packed.size() - p.size;
+        }
+        bytes_ = std::move(packed);
+        unused_ = 0;
+    }
+    return index;
+}
+
+std::vector<std::string> Items::strings() const {
+    std::vector<std::string> texts;
+    texts.reserve(size());
+    for (std::size_t i = 0; i < size(); ++i) texts.emplace_back((*this)[i]);
+    return texts;
 }
 
 }  // namespace list_order

@@ -16,7 +16,7 @@ void Form1::List_list_Click() {
     store_.trySettle();
     for (int i = 0; i < c_.List_list.count(); ++i) {
         if (c_.List_list.selected(i)) {
-            const std::string name = c_.List_list.itemText(i);
+            const std::string name(c_.List_list.itemText(i));
             guarded([&] { LoadEntries(name); }, true);
         }
     }
@@ -42,7 +42,7 @@ void Form1::LoadEntries(const std::string& name) {
     c_.Combo3.setEnabled(information);
     c_.Combo3.setText(information ? "Info" : "  ");
 
-    std::optional<std::vector<std::string>> titles = catalogue::entryTitles(bytes);
+    std::optional<list_order::Items> titles = catalogue::entryTitles(bytes);
     if (!titles) {
         throw CatalogueError(entryFile, "the file ends inside an entry (" +
                                             std::to_string(catalogue::splitLines(bytes).size()) +
@@ -113,7 +113,7 @@ void Form1::limitTyping(ui::ComboBox& box, std::size_t limit, int& key) {
 std::optional<std::string> Form1::selectedTitle() const {
     const int row = c_.List1.selectedIndex();
     if (row < 0) return std::nullopt;
-    return c_.List1.itemText(row);
+    return std::string(c_.List1.itemText(row));
 }
 
 }  // namespace main_window

@@ -2,7 +2,10 @@
 
 #include <functional>
 #include <string>
+#include <string_view>
 #include <vector>
+
+#include "list_order/list_order.h"
 
 // The window controls the program's windows are written against. Text is ISO-8859-1 bytes, the
 // same bytes the files hold, so every length counts characters. Two backends implement these:
@@ -58,11 +61,11 @@ class ListBox {
     // when there is none. Removing the selected item leaves nothing selected.
     virtual bool removeItem(const std::string& text) = 0;
     // Replaces every item in one go; the way to fill a long list.
-    virtual void setItems(std::vector<std::string> items) = 0;
+    virtual void setItems(list_order::Items items) = 0;
     virtual void clear() = 0;
     virtual int count() const = 0;
     // The item's text, as the box holds it until it changes.
-    virtual const std::string& itemText(int index) const = 0;
+    virtual std::string_view itemText(int index) const = 0;
     // The selected item's index, or -1 when none is selected.
     virtual int selectedIndex() const = 0;
     virtual bool selected(int index) const = 0;

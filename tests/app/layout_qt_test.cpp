@@ -10,7 +10,7 @@
 #include <QIcon>
 #include <QImage>
 #include <QLineEdit>
-#include <QListWidget>
+#include <QListView>
 #include <QTest>
 #include <QTimer>
 
@@ -24,8 +24,10 @@ namespace {
 struct Windows {
     Windows() : program(filled(files), platform) {
         program.start();
-        const auto music = program.mainWindow().List_list->findItems("Music", Qt::MatchExactly);
-        program.mainWindow().List_list->setCurrentItem(music.front());  // opens the list
+        QListView* lists = program.mainWindow().List_list;
+        const auto music = lists->model()->match(lists->model()->index(0, 0), Qt::DisplayRole,
+                                                 "Music", 1, Qt::MatchExactly);
+        lists->setCurrentIndex(music.front());  // opens the list
     }
     static const std::string& filled(const test_support::TempFolder& files) {
         test_support::putMusicCatalogue(files);

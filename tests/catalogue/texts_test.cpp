@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <climits>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
@@ -147,6 +148,35 @@ TEST(Latin1, ItemOrderPutsAPrefixFirst) {
     std::sort(expected.begin(), expected.end(), itemLess);
     sortItems(items);
     EXPECT_EQ(items, expected);
+}
+
+// A long list box's items: sorted by their leading bytes' digits, then moved one at a time and
+// packed once most of their buffer is texts taken out; always the order one sort would give.
+TEST(Latin1, ItemsStayInOrderThroughInsertsAndRemovals) {
+    std::vector<std::string> texts;
+    for (unsigned n = 0; n < 3000; ++n) {
+        const unsigned m = n * 2654435761u;
+        std::string text = std::to_string(m % 977) + (m & 1 ? "\xC9t\xE9 " : "\xE9T\xC9 ");
+        text.insert(m % 3, m & 2 ? "Road " : "ROAD ");
+        texts.push_back(text + (m & 4 ? "" : std::to_string(n)));
+    }
+    std::sort(texts.begin(), texts.end());
+    texts.erase(std::unique(texts.begin(), texts.end()), texts.end());
+    list_order::Items items(texts);
+    std::sort(texts.begin(), texts.end(), itemLess);
+    ASSERT_EQ(items.strings(), texts);
+    for (std::size_t i = 0; i < 2500; ++i) {
+        const std::string gone = texts[(i * 7919) % texts.size()];
+        std::erase(texts, gone);
+        EXPECT_NE(items.remove(gone), list_order::Items::npos) << gone;
+    }
+    EXPECT_EQ(items.remove("not there"), list_order::Items::npos);
+    for (const std::string added : {"0", "road", "ROAD", "\xFF", "Road 5"}) {
+        texts.insert(std::upper_bound(texts.begin(), texts.end(), added, itemLess), added);
+        EXPECT_EQ(items[items.insert(added)], added);
+    }
+    EXPECT_EQ(items.strings(), texts);
+    EXPECT_THROW(items.at(items.size()), std::out_of_range);
 }
 
 // Each record as "line:field|field|...", "!" after it when a quoted field stays open; then the

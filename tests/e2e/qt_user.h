@@ -7,7 +7,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QLineEdit>
-#include <QListWidget>
+#include <QListView>
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
@@ -43,13 +43,22 @@ inline void click(QAbstractButton* button) {
     QTest::mouseClick(button, Qt::LeftButton);
 }
 
-inline void pick(QListWidget* list, const QString& text) {
-    const auto found = list->findItems(text, Qt::MatchExactly);
+// What a list shows: its number of rows and one row's text.
+inline int rows(const QListView* list) {
+    return list->model()->rowCount();
+}
+inline QString rowText(const QListView* list, int row) {
+    return list->model()->index(row, 0).data().toString();
+}
+
+inline void pick(QListView* list, const QString& text) {
+    const auto found = list->model()->match(list->model()->index(0, 0), Qt::DisplayRole, text, -1,
+                                            Qt::MatchExactly);
     ASSERT_EQ(found.size(), 1) << text.toStdString();
-    list->scrollToItem(found.front());
+    list->scrollTo(found.front());
     QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
-                      list->visualItemRect(found.front()).center());
-    ASSERT_TRUE(found.front()->isSelected()) << text.toStdString();
+                      list->visualRect(found.front()).center());
+    ASSERT_TRUE(list->selectionModel()->isSelected(found.front())) << text.toStdString();
 }
 
 // Empties a text field (a combo box's own line) with End and Backspace, then types `latin1`

@@ -5,7 +5,7 @@
 #include <QCheckBox>
 #include <QFileSystemModel>
 #include <QLineEdit>
-#include <QListWidget>
+#include <QListView>
 #include <QPushButton>
 #include <QTest>
 #include <QTreeView>
@@ -39,8 +39,9 @@ TEST(ExportDialogOnQt, ExportsToAnyFolderAndSavesItOnTheCloseBox) {
     // Every box must take the user's answer: none may sit on a disabled window.
     qt_user::Boxes boxes;
     program.start();
-    mainView.List_list->setCurrentRow(0);  // the user picks the list
-    ASSERT_EQ(mainView.List1->count(), 10);
+    mainView.List_list->setCurrentIndex(
+        mainView.List_list->model()->index(0, 0));  // the user picks the list
+    ASSERT_EQ(mainView.List1->model()->rowCount(), 10);
     QTest::mouseClick(mainView.Command_export, Qt::LeftButton);
     QWidget* dialog = view.widget();
     ASSERT_TRUE(dialog->isVisible());

@@ -36,7 +36,7 @@ struct OpenMovies : export_test::ExportFixture {
 TEST(ExportRun, TextReportThenHtmlPageThenAReplacedReport) {
     OpenMovies f;
     f.main.folder.put("Movies.top", "Top line one\r\nTop line two");
-    f.main.view.List1.setItems({"Wars", "Star Wars", "Star"});
+    f.main.view.List1.setItems(std::vector<std::string>{"Wars", "Star Wars", "Star"});
     f.main.view.List_list.setSelected(0, true);
 
     EXPECT_EQ(f.exportNow(), std::vector<std::string>{"Done 64: Export done!"});

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <QLineEdit>
-#include <QListWidget>
+#include <QListView>
 #include <QPushButton>
 #include <QTest>
 #include <QWindow>

@@ -12,7 +12,7 @@ class QCheckBox;
 class QComboBox;
 class QLabel;
 class QLineEdit;
-class QListWidget;
+class QListView;
 class QPushButton;
 class QWidget;
 
@@ -91,25 +91,23 @@ class QtLabel : public Label {
 // long lists are filled in one call.
 class QtListBox : public ListBox {
   public:
-    explicit QtListBox(QListWidget* list);
+    explicit QtListBox(QListView* list);
+    ~QtListBox() override;
     void addItem(const std::string& text) override;
     bool removeItem(const std::string& text) override;
-    void setItems(std::vector<std::string> items) override;
+    void setItems(list_order::Items items) override;
     void clear() override;
-    int count() const override { return static_cast<int>(items_.size()); }
-    const std::string& itemText(int index) const override;
+    int count() const override;
+    std::string_view itemText(int index) const override;
     int selectedIndex() const override;
     bool selected(int index) const override;
     void setSelected(int index, bool selected) override;
     void refresh() override;
 
   private:
-    // Brings the list box to `items` by inserting and removing a few rows; false when more
-    // would change and it is rebuilt instead.
-    bool applyFewChanges(const std::vector<std::string>& items);
-
-    QListWidget* list_;
-    std::vector<std::string> items_;
+    class Rows;
+    QListView* list_;
+    Rows* rows_;  // owned by the view
     bool byCode_ = false;
 };
 

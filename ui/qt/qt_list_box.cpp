@@ -1,132 +1,118 @@
-// The list box on a QListWidget: its rows kept in the list boxes' own order, not the locale's.
+// The list box on a QListView over its own items: the view asks only for the rows it shows, so a
+// list of 32,767 titles fills at once. Rows stay in the list boxes' own order, not the locale's.
+#include <QAbstractListModel>
 #include <QItemSelectionModel>
-#include <QListWidget>
-#include <algorithm>
+#include <QListView>
 
 #include "list_order/list_order.h"
 #include "ui/qt/qt_controls.h"
 
 namespace ui::qt {
 
-QtListBox::QtListBox(QListWidget* list) : list_(list) {
+// The rows of one list box. The box changes its items only through the calls that tell the view.
+class QtListBox::Rows : public QAbstractListModel {
+  public:
+    using QAbstractListModel::QAbstractListModel;
+
+    int rowCount(const QModelIndex& parent) const override {
+        return parent.isValid() ? 0 : static_cast<int>(items.size());
+    }
+    QVariant data(const QModelIndex& index, int role) const override {
+        if (role != Qt::DisplayRole || !index.isValid() || index.parent().isValid()) return {};
+        const std::string_view text = items.at(static_cast<std::size_t>(index.row()));
+        return QString::fromLatin1(text.data(), static_cast<qsizetype>(text.size()));
+    }
+
+    void insert(const std::string& text) {
+        const int row = static_cast<int>(items.placeFor(text));
+        beginInsertRows({}, row, row);
+        items.insert(text);
+        endInsertRows();
+    }
+    bool remove(const std::string& text) {
+        const std::size_t at = items.find(text);
+        if (at == list_order::Items::npos) return false;
+        beginRemoveRows({}, static_cast<int>(at), static_cast<int>(at));
+        items.remove(text);
+        endRemoveRows();
+        return true;
+    }
+    void replace(list_order::Items replacement) {
+        beginResetModel();
+        items = std::move(replacement);
+        endResetModel();
+    }
+
+    list_order::Items items;
+};
+
+QtListBox::QtListBox(QListView* list) : list_(list), rows_(new Rows(list)) {
+    list_->setModel(rows_);
     list_->setSelectionMode(QAbstractItemView::SingleSelection);
-    list_->setSortingEnabled(false);  // the order is ours, not the locale's
     list_->setUniformItemSizes(true);
-    QObject::connect(list_, &QListWidget::itemSelectionChanged, [this] {
+    list_->setEditTriggers(QAbstractItemView::NoEditTriggers);
+    QObject::connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, [this] {
         if (!byCode_ && onClick) onClick();
     });
 }
 
+QtListBox::~QtListBox() = default;
+
 void QtListBox::addItem(const std::string& text) {
-    const auto at = std::upper_bound(items_.begin(), items_.end(), text, list_order::itemLess);
-    const int index = static_cast<int>(at - items_.begin());
-    items_.insert(at, text);
     byCode_ = true;
-    list_->insertItem(index, toQt(text));
+    rows_->insert(text);
     byCode_ = false;
 }
 
 bool QtListBox::removeItem(const std::string& text) {
-    const auto at = std::lower_bound(items_.begin(), items_.end(), text, list_order::itemLess);
-    if (at == items_.end() || *at != text) return false;
-    const int index = static_cast<int>(at - items_.begin());
-    items_.erase(at);
     byCode_ = true;
-    delete list_->takeItem(index);
+    const bool removed = rows_->remove(text);
     byCode_ = false;
-    return true;
+    return removed;
 }
 
-void QtListBox::setItems(std::vector<std::string> items) {
-    list_order::sortItems(items);
+void QtListBox::setItems(list_order::Items items) {
     byCode_ = true;
     list_->clearSelection();
-    if (!applyFewChanges(items)) {
-        QStringList texts;
-        texts.reserve(static_cast<qsizetype>(items.size()));
-        for (const auto& item : items) texts.append(toQt(item));
-        list_->setUpdatesEnabled(false);
-        list_->clear();
-        list_->addItems(texts);
-        list_->setUpdatesEnabled(true);
-    }
-    items_ = std::move(items);
+    rows_->replace(std::move(items));
     byCode_ = false;
-}
-
-bool QtListBox::applyFewChanges(const std::vector<std::string>& items) {
-    // A list shown again after one entry was added, changed or deleted differs in a few rows;
-    // changing just those keeps a long list box from being rebuilt item by item.
-    constexpr std::size_t kMaxChanges = 16;
-    if (items_.empty()) return false;
-    const std::size_t gap =
-        items.size() > items_.size() ? items.size() - items_.size() : items_.size() - items.size();
-    if (gap > kMaxChanges) return false;
-    struct Change {
-        int row;
-        const std::string* insert;  // nothing: remove the row
-    };
-    std::vector<Change> changes;
-    std::size_t i = 0;
-    std::size_t j = 0;
-    int row = 0;
-    while (i < items_.size() || j < items.size()) {
-        if (i < items_.size() && j < items.size() && items_[i] == items[j]) {
-            ++i, ++j, ++row;
-        } else if (j >= items.size() ||
-                   (i < items_.size() && list_order::itemLess(items_[i], items[j]))) {
-            changes.push_back({row, nullptr});
-            ++i;
-        } else {
-            changes.push_back({row, &items[j]});
-            ++j, ++row;
-        }
-        if (changes.size() > kMaxChanges) return false;
-    }
-    for (const Change& change : changes) {
-        if (change.insert != nullptr) {
-            list_->insertItem(change.row, toQt(*change.insert));
-        } else {
-            delete list_->takeItem(change.row);
-        }
-    }
-    return true;
 }
 
 void QtListBox::clear() {
-    items_.clear();
-    byCode_ = true;
-    list_->clear();
-    byCode_ = false;
+    setItems({});
 }
 
-const std::string& QtListBox::itemText(int index) const {
-    return items_.at(static_cast<std::size_t>(index));
+int QtListBox::count() const {
+    return static_cast<int>(rows_->items.size());
+}
+
+std::string_view QtListBox::itemText(int index) const {
+    return rows_->items.at(static_cast<std::size_t>(index));
 }
 
 int QtListBox::selectedIndex() const {
-    // Asks the selection, not every row: a long list would otherwise be walked item by item.
+    // Asks the selection, not every row: a long list would otherwise be walked row by row.
     const QModelIndexList rows = list_->selectionModel()->selectedRows();
     return rows.isEmpty() ? -1 : rows.front().row();
 }
 
 bool QtListBox::selected(int index) const {
-    const QListWidgetItem* item = list_->item(index);
-    return item != nullptr && item->isSelected();
+    const QModelIndex row = rows_->index(index);
+    return row.isValid() && list_->selectionModel()->isSelected(row);
 }
 
 void QtListBox::setSelected(int index, bool selected) {
-    QListWidgetItem* item = list_->item(index);
-    if (item == nullptr) return;
+    const QModelIndex row = rows_->index(index);
+    if (!row.isValid()) return;
     byCode_ = true;
-    if (selected) {
-        list_->setCurrentItem(item);
-    }
-    item->setSelected(selected);
+    if (selected) list_->setCurrentIndex(row);  // selects it too, and scrolls it into sight
+    list_->selectionModel()->select(
+        row, selected ? QItemSelectionModel::Select : QItemSelectionModel::Deselect);
     byCode_ = false;
 }
 
 void QtListBox::refresh() {
     list_->viewport()->update();
 }
+
 }  // namespace ui::qt

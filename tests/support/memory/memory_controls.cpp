@@ -28,24 +28,20 @@ bool MemoryButton::click() {
 }
 
 void MemoryListBox::addItem(const std::string& text) {
-    const auto at = std::upper_bound(items_.begin(), items_.end(), text, list_order::itemLess);
-    const int index = static_cast<int>(at - items_.begin());
-    items_.insert(at, text);
+    const int index = static_cast<int>(items_.insert(text));
     if (selected_ >= index) ++selected_;
 }
 
 bool MemoryListBox::removeItem(const std::string& text) {
-    const auto at = std::lower_bound(items_.begin(), items_.end(), text, list_order::itemLess);
-    if (at == items_.end() || *at != text) return false;
-    const int index = static_cast<int>(at - items_.begin());
-    items_.erase(at);
+    const std::size_t at = items_.remove(text);
+    if (at == list_order::Items::npos) return false;
+    const int index = static_cast<int>(at);
     if (selected_ == index) selected_ = -1;
     if (selected_ > index) --selected_;
     return true;
 }
 
-void MemoryListBox::setItems(std::vector<std::string> items) {
-    list_order::sortItems(items);
+void MemoryListBox::setItems(list_order::Items items) {
     items_ = std::move(items);
     selected_ = -1;
 }
@@ -64,8 +60,10 @@ bool MemoryListBox::userSelect(int index) {
 }
 
 bool MemoryListBox::userSelect(const std::string& text) {
-    const auto at = std::find(items_.begin(), items_.end(), text);
-    return at != items_.end() && userSelect(static_cast<int>(at - items_.begin()));
+    for (int i = 0; i < count(); ++i) {
+        if (itemText(i) == text) return userSelect(i);
+    }
+    return false;
 }
 
 bool MemoryComboBox::setText(const std::string& text) {

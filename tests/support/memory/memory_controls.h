@@ -71,10 +71,12 @@ class MemoryListBox : public Control<ListBox> {
   public:
     void addItem(const std::string& text) override;
     bool removeItem(const std::string& text) override;
-    void setItems(std::vector<std::string> items) override;
+    void setItems(list_order::Items items) override;
     void clear() override { setItems({}); }
     int count() const override { return static_cast<int>(items_.size()); }
-    const std::string& itemText(int index) const override { return items_.at(index); }
+    std::string_view itemText(int index) const override {
+        return items_.at(static_cast<std::size_t>(index));
+    }
     int selectedIndex() const override { return selected_; }
     bool selected(int index) const override { return index == selected_; }
     void setSelected(int index, bool selected) override;
@@ -84,10 +86,10 @@ class MemoryListBox : public Control<ListBox> {
     bool userSelect(int index);
     // The user selects the item with this text.
     bool userSelect(const std::string& text);
-    const std::vector<std::string>& items() const { return items_; }
+    std::vector<std::string> items() const { return items_.strings(); }
 
   private:
-    std::vector<std::string> items_;
+    list_order::Items items_;
     int selected_ = -1;
 };
 
