@@ -13,7 +13,6 @@
 #include "catalogue/folder_lock.h"
 #include "catalogue/records.h"
 #include "tests/export/export_fixture.h"
-#include "tests/support/temp_folder.h"
 
 namespace {
 

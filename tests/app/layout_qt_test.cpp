@@ -7,7 +7,6 @@
 #include <QAccessible>
 #include <QApplication>
 #include <QComboBox>
-#include <QIcon>
 #include <QImage>
 #include <QLineEdit>
 #include <QListView>

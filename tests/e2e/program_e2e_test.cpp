@@ -4,8 +4,6 @@
 #include <gtest/gtest.h>
 
 #include <QFileSystemModel>
-#include <QListView>
-#include <QPushButton>
 #include <QTest>
 #include <QTreeView>
 #include <cstdlib>

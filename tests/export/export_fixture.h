@@ -8,7 +8,6 @@
 #include <string>
 
 #include "tests/support/memory_form1.h"
-#include "tests/support/temp_folder.h"
 
 // The export dialog on in-memory controls beside the main window, over a temporary catalogue
 // folder, with HOME pointing at a folder of its own and an empty output folder.

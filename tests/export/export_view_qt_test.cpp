@@ -1,12 +1,7 @@
 // The export dialog on Qt, opened from the real main window and driven through its widgets.
 #include <gtest/gtest.h>
 
-#include <QApplication>
-#include <QCheckBox>
 #include <QFileSystemModel>
-#include <QLineEdit>
-#include <QListView>
-#include <QPushButton>
 #include <QTest>
 #include <QTreeView>
 #include <cstdlib>
@@ -15,7 +10,6 @@
 #include "app/program.h"
 #include "tests/e2e/qt_user.h"
 #include "tests/export/export_fixture.h"
-#include "tests/support/temp_folder.h"
 
 namespace {
 

@@ -12,7 +12,6 @@
 #include "catalogue/records.h"
 #include "list_order/list_order.h"
 #include "tests/export/export_fixture.h"
-#include "tests/support/temp_folder.h"
 
 namespace {
 

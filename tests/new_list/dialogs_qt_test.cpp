@@ -2,9 +2,6 @@
 // the main window is disabled while a dialog is open and usable again however it closes.
 #include <gtest/gtest.h>
 
-#include <QLineEdit>
-#include <QListView>
-#include <QPushButton>
 #include <QTest>
 #include <QWindow>
 #include <filesystem>

@@ -8,7 +8,6 @@
 #include <optional>
 
 #include "catalogue/records.h"
-#include "tests/support/memory/memory_controls.h"
 #include "tests/support/memory_form1.h"
 
 namespace {

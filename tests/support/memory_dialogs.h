@@ -1,8 +1,5 @@
 #pragma once
 
-#include <string>
-#include <vector>
-
 #include "export/form_export.h"
 #include "new_list/form_new_list.h"
 #include "tests/support/memory/memory_controls.h"

@@ -9,7 +9,6 @@
 #include "main_window/form1.h"
 #include "new_list/form_new_list.h"
 #include "tests/support/faulty_sys.h"
-#include "tests/support/memory/memory_controls.h"
 #include "tests/support/memory_dialogs.h"
 #include "tests/support/temp_folder.h"
 

@@ -11,7 +11,6 @@
 #include <QListView>
 #include <QLocale>
 #include <QMessageBox>
-#include <QPushButton>
 #include <QTest>
 #include <QTimer>
 #include <tuple>
