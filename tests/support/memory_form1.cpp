@@ -74,7 +74,9 @@ void MainWindowFixture::expectBox(std::size_t before, int style, const std::stri
     ASSERT_EQ(shown.size(), before + 1);
     EXPECT_EQ(shown.back().style, style);
     EXPECT_EQ(shown.back().title, title);
-    if (!prompt.empty()) EXPECT_EQ(shown.back().prompt, prompt);
+    if (!prompt.empty()) {
+        EXPECT_EQ(shown.back().prompt, prompt);
+    }
 }
 
 }  // namespace test_support
