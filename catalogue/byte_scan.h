@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <bit>
 #include <cstdint>
 #include <cstring>
@@ -57,11 +58,19 @@ inline std::size_t countOf(std::string_view text, std::size_t from, std::size_t 
     const char* const bytes = text.data();
     std::size_t count = 0;
 #if defined(__SSE2__)
-    for (; from + 16 <= to; from += 16) {
-        const __m128i block = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + from));
-        const int hits =
-            _mm_movemask_epi8(_mm_cmpeq_epi8(block, _mm_set1_epi8(static_cast<char>(Byte))));
-        count += static_cast<std::size_t>(std::popcount(static_cast<unsigned>(hits)));
+    // Each of sixteen byte counters takes up to 255 blocks; their sums are then added up. (A
+    // count of mask bits would call a library routine on processors without a popcount.)
+    const __m128i byte = _mm_set1_epi8(static_cast<char>(Byte));
+    while (from + 16 <= to) {
+        __m128i counters = _mm_setzero_si128();
+        const std::size_t blocks = std::min<std::size_t>((to - from) / 16, 255);
+        for (std::size_t b = 0; b < blocks; ++b, from += 16) {
+            const __m128i block = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + from));
+            counters = _mm_sub_epi8(counters, _mm_cmpeq_epi8(block, byte));
+        }
+        const __m128i sums = _mm_sad_epu8(counters, _mm_setzero_si128());
+        count += static_cast<std::size_t>(_mm_cvtsi128_si32(sums)) +
+                 static_cast<std::size_t>(_mm_extract_epi16(sums, 4));
     }
 #endif
     for (; from < to; ++from) count += static_cast<unsigned char>(bytes[from]) == Byte ? 1 : 0;

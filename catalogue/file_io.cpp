@@ -36,7 +36,9 @@ std::string readAll(Sys& sys, const std::string& fullPath, const std::string& sh
     }
     if (stamp != nullptr) *stamp = stampFrom(st);
     std::string bytes;
-    bytes.reserve(static_cast<size_t>(st.st_size));
+    // Room for a line past the end: adding an entry appends one to a file it has just read, and
+    // a long list's file is then not moved to a bigger buffer.
+    bytes.reserve(static_cast<size_t>(st.st_size) + 256);
     char buffer[65536];
     for (;;) {
         const ssize_t got = sys.read(fd, buffer, sizeof buffer);

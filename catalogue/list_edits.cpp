@@ -107,7 +107,7 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
     const bool sameTitle = entry.title == oldTitle;
     const std::optional<std::string> articleText =
         sameTitle ? t.readTextIfExists(articleName) : t.readText(articleName);
-    const std::string articles = articleText.value_or("");
+    const std::string_view articles = articleText ? std::string_view(*articleText) : "";
     const bool hasLine = findArticleLine(articles, oldTitle) != std::string::npos;
     if (articleText && (!sameTitle || !hasLine)) {
         if (!hasLine || upperFirst(entry.title) != upperFirst(oldTitle)) {
@@ -116,9 +116,8 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
                 planArticleNumber(t, list.name, entry.title[0], words);
             if (!number) return refused(Refused::NumbersUsedUp, std::move(words));
             result.articleNumber = std::move(*number);
-            std::string moved = removeArticleLine(articles, oldTitle);
-            moved += articleLine(entry.title, result.articleNumber);
-            t.write(articleName, std::move(moved));
+            t.write(articleName, removeArticleLine(articles, oldTitle,
+                                                   articleLine(entry.title, result.articleNumber)));
         } else {
             t.write(articleName, *renameArticleLine(articles, oldTitle, entry.title));
         }

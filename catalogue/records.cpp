@@ -221,14 +221,15 @@ std::optional<std::string> renameArticleLine(std::string_view articles, std::str
     return text;
 }
 
-std::string removeArticleLine(std::string_view articles, std::string_view title) {
+std::string removeArticleLine(std::string_view articles, std::string_view title,
+                              std::string_view appended) {
     const std::size_t at = findArticleLine(articles, title);
-    if (at == npos) return std::string(articles);
-    const std::size_t end = lineEnd(articles, at);
+    const std::size_t end = at == npos ? at : lineEnd(articles, at);
     std::string text;
-    text.reserve(articles.size() - (end - at));
+    text.reserve(articles.size() - (end - at) + appended.size());  // npos - npos: nothing out
     text.append(articles.substr(0, at));
-    text.append(articles.substr(end));
+    if (at != npos) text.append(articles.substr(end));
+    text.append(appended);
     return text;
 }
 

@@ -93,8 +93,10 @@ std::string articleLine(std::string_view title, std::string_view number);
 std::optional<std::string> renameArticleLine(std::string_view articles, std::string_view oldTitle,
                                              std::string_view newTitle);
 
-// The article text without the title's first line; unchanged when the title has no line.
-std::string removeArticleLine(std::string_view articles, std::string_view title);
+// The article text without the title's first line (unchanged when the title has no line), and
+// then `appended`.
+std::string removeArticleLine(std::string_view articles, std::string_view title,
+                              std::string_view appended = {});
 
 // The list index without the first line equal to `name` ignoring case; unchanged when none.
 std::string removeIndexLine(std::string_view index, std::string_view name);

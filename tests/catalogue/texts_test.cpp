@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "catalogue/byte_scan.h"
 #include "catalogue/csv.h"
 #include "catalogue/file_names.h"
 #include "catalogue/file_text.h"
@@ -177,6 +178,20 @@ TEST(Latin1, ItemsStayInOrderThroughInsertsAndRemovals) {
     }
     EXPECT_EQ(items.strings(), texts);
     EXPECT_THROW(items.at(items.size()), std::out_of_range);
+}
+
+// Counting a byte sixteen at a time, with the counters summed every 255 blocks, counts as one by
+// one would, from and to anywhere.
+TEST(ByteScan, CountOfCountsAsOneByOneWould) {
+    std::string text(5000, '\r');  // a counter overflows at 256 of them
+    text.resize(12000, 'x');
+    for (std::size_t i = 5000; i < text.size(); i += 1 + i % 5) text[i] = '\r';
+    for (const auto& [from, to] : std::vector<std::pair<std::size_t, std::size_t>>{
+             {0, 12000}, {3, 4083}, {1, 4097}, {17, 11000}, {5, 5}, {0, 15}}) {
+        EXPECT_EQ(countOf<'\r'>(text, from, to), static_cast<std::size_t>(std::count(
+                                                     text.begin() + from, text.begin() + to, '\r')))
+            << from << ".." << to;
+    }
 }
 
 // Each record as "line:field|field|...", "!" after it when a quoted field stays open; then the

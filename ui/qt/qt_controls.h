@@ -108,6 +108,7 @@ class QtListBox : public ListBox {
     class Rows;
     QListView* list_;
     Rows* rows_;  // owned by the view
+    QMetaObject::Connection clicks_;
     bool byCode_ = false;
 };
 

@@ -51,12 +51,16 @@ QtListBox::QtListBox(QListView* list) : list_(list), rows_(new Rows(list)) {
     list_->setSelectionMode(QAbstractItemView::SingleSelection);
     list_->setUniformItemSizes(true);
     list_->setEditTriggers(QAbstractItemView::NoEditTriggers);
-    QObject::connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, [this] {
-        if (!byCode_ && onClick) onClick();
-    });
+    clicks_ =
+        QObject::connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, [this] {
+            if (!byCode_ && onClick) onClick();
+        });
 }
 
-QtListBox::~QtListBox() = default;
+// The view may outlive the box (a window's widgets go with the window): it then calls no more.
+QtListBox::~QtListBox() {
+    QObject::disconnect(clicks_);
+}
 
 void QtListBox::addItem(const std::string& text) {
     byCode_ = true;
