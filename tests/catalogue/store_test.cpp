@@ -193,6 +193,18 @@ TEST(Recovery, FinishesACompleteJournalAndDropsATornOneWithItsStagedFiles) {
     EXPECT_EQ(torn.get("b.dat"), "b old\r\n");
 }
 
+// Left half done after the transaction began, by another one that failed meanwhile.
+TEST(Recovery, ACommitFinishesAChangeLeftHalfDoneBeforeItsOwn) {
+    TempFolder folder;
+    Store store(folder.path());
+    Transaction t = store.begin();
+    putHalfDone(folder, kHalfDone);
+    t.write("b.dat", "b newer\r\n");
+    t.commit();
+    EXPECT_EQ(folder.listing(), "a.dat\nb.dat\n");
+    EXPECT_EQ(folder.get("a.dat") + folder.get("b.dat"), "a new\r\nb newer\r\n");
+}
+
 TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
     TempFolder folder;
     putHalfDone(folder, kHalfDone);

@@ -184,9 +184,10 @@ TEST_F(Form1Test, DeleteListAsksTwiceAndShowsTheListsLeft) {
 }
 
 // Each writing button, once its questions are answered, first finishes a change that an earlier
-// run left unfinished, says so, and stops there: it writes nothing else.
+// run left unfinished, says so, and stops there: it writes nothing else. Opening a list finishes
+// it quietly.
 TEST_F(Form1Test, EveryEditFinishesAnEarlierChangeFirstAndStops) {
-    startWithRock();
+    startWithRock({"Jazz"});
     const Files before = files();
     const std::pair<ui::memory::MemoryButton*, std::vector<Answer>> buttons[] = {
         {&view.Command_add, {Answer::Ok}},
@@ -208,6 +209,14 @@ TEST_F(Form1Test, EveryEditFinishesAnEarlierChangeFirstAndStops) {
             << platform.shown().back().prompt;
         EXPECT_EQ(files(), before) << button->caption();
     }
+    // Opening a list finishes one as well, without a word.
+    folder.put("left.del", "");
+    folder.put(std::string(catalogue::kJournalName),
+               catalogue::encodeJournal({{}, {"left.del"}, {}}));
+    const std::size_t boxes = platform.shown().size();
+    open("Jazz");
+    EXPECT_EQ(files(), before);
+    EXPECT_EQ(platform.shown().size(), boxes);
 }
 
 }  // namespace
