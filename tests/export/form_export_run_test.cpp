@@ -51,12 +51,14 @@ TEST(ExportRun, TextReportThenHtmlPageThenAReplacedReport) {
     EXPECT_EQ(f.out.get("Movies.html"),
               exporting::HtmlPage("Movies", text.substr(0, text.size() - 2)));
 
-    // A replaced report keeps the permission bits its owner gave it.
+    // A replaced report keeps the permission bits its owner gave it; this one has the date.
     f.main.folder.put("Movies.top", "Only one line\r\n");
     ::chmod(f.out.file("Movies.TXT").c_str(), 0640);
     f.dialog.Checkhtml.userToggle();
+    f.dialog.Checkdate.userToggle();
     f.exportNow();
     EXPECT_TRUE(f.out.get("Movies.TXT").starts_with("Only one line\r\n.[Movies]"));
+    EXPECT_NE(f.out.get("Movies.TXT").find("-06.12.2026-.\r\n"), std::string::npos);
     struct stat st {};
     EXPECT_EQ(::stat(f.out.file("Movies.TXT").c_str(), &st) == 0 ? st.st_mode & 0777 : 0, 0640u);
     EXPECT_EQ(f.out.listing(), "Movies.TXT\nMovies.html\n");
