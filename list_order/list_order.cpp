@@ -89,14 +89,15 @@ std::vector<std::size_t> orderOf(std::size_t count, TextAt text) {
     std::vector<Head> spare(count);
     constexpr int kBits = 11;
     for (int shift = 0; shift < 64; shift += kBits) {
-        std::array<std::size_t, (1 << kBits) + 1> starts{};
+        // Where the heads of each digit go: counted, then summed up.
+        std::array<std::size_t, (1 << kBits) + 1> places{};
         const auto digit = [shift](const Head& h) {
             return static_cast<std::size_t>(h.high >> shift) & ((1u << kBits) - 1);
         };
-        for (const Head& h : heads) ++starts[digit(h) + 1];
-        if (std::find(starts.begin(), starts.end(), count) != starts.end()) continue;  // one digit
-        for (std::size_t d = 1; d < starts.size(); ++d) starts[d] += starts[d - 1];
-        for (const Head& h : heads) spare[starts[digit(h)]++] = h;
+        for (const Head& h : heads) ++places[digit(h) + 1];
+        if (std::find(places.begin(), places.end(), count) != places.end()) continue;  // one digit
+        for (std::size_t d = 1; d < places.size(); ++d) places[d] += places[d - 1];
+        for (const Head& h : heads) spare[places[digit(h)]++] = h;
         heads.swap(spare);
     }
     for (auto run = heads.begin(); run != heads.end();) {
