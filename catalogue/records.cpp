@@ -73,9 +73,11 @@ std::string flagFile(std::string_view list) {
 std::optional<list_order::Items> entryTitles(std::string_view bytes) {
     // The titles go into one buffer, not one string each: a long list opens that much faster.
     std::string titles;
-    titles.reserve(bytes.size() / 3);  // the title is mostly the longest of an entry's lines
+    // Room enough not to move them while they grow: a title is at most the larger half of its
+    // entry, and an entry takes some 50 bytes or more. What stays unused is never touched.
+    titles.reserve(bytes.size() / 2);
     std::vector<list_order::Items::Place> places;
-    places.reserve(bytes.size() / 64 + 1);  // entries of a real list take some 60 bytes or more
+    places.reserve(bytes.size() / 32 + 1);
     // Lines as lineAt() splits them, with their ends found sixteen bytes at a time.
     std::size_t lines = 0;
     for (std::size_t at = 0; at < bytes.size(); ++lines) {
