@@ -27,6 +27,5 @@ std::size_t findIgnoreCase(std::string_view hay, std::string_view needle, std::s
 
 // The list boxes' order, which reports and checks of stored files share.
 using list_order::itemLess;
-using list_order::sortItems;
 
 }  // namespace catalogue

@@ -46,9 +46,10 @@ std::uint64_t headPart(std::string_view text, std::size_t from) {
 
 namespace {
 
-// The indexes 0 to `count` - 1 in the order of the texts `text(i)` gives.
-template <class TextAt>
-std::vector<std::size_t> orderOf(std::size_t count, TextAt text) {
+// The indexes of `places` in the order of the texts they give in `bytes`.
+std::vector<std::size_t> orderOf(std::string_view bytes, const std::vector<Items::Place>& places) {
+    const std::size_t count = places.size();
+    const auto text = [&](std::size_t i) { return bytes.substr(places[i].at, places[i].size); };
     // Every text folded once into one buffer; the sort then compares plain bytes, and mostly
     // only the first sixteen of them, held next to the text's number.
     std::size_t total = 0;
@@ -113,15 +114,6 @@ std::vector<std::size_t> orderOf(std::size_t count, TextAt text) {
 
 }  // namespace
 
-void sortItems(std::vector<std::string>& items) {
-    const std::vector<std::size_t> order =
-        orderOf(items.size(), [&](std::size_t i) { return std::string_view(items[i]); });
-    std::vector<std::string> sorted;
-    sorted.reserve(items.size());
-    for (const std::size_t i : order) sorted.push_back(std::move(items[i]));
-    items = std::move(sorted);
-}
-
 Items::Items(const std::vector<std::string>& texts) {
     places_.reserve(texts.size());
     for (const std::string& text : texts) {
@@ -132,9 +124,7 @@ Items::Items(const std::vector<std::string>& texts) {
 }
 
 Items::Items(std::string bytes, std::vector<Place> places) : bytes_(std::move(bytes)) {
-    const std::vector<std::size_t> order = orderOf(places.size(), [&](std::size_t i) {
-        return std::string_view(bytes_).substr(places[i].at, places[i].size);
-    });
+    const std::vector<std::size_t> order = orderOf(bytes_, places);
     places_.reserve(places.size());
     for (const std::size_t i : order) places_.push_back(places[i]);
 }

@@ -27,9 +27,6 @@ inline const std::array<unsigned char, 256> kFoldTable = [] {
 // Case-insensitive, ties broken by byte value.
 bool itemLess(std::string_view a, std::string_view b);
 
-// Sorts items into the list-box order. Folds each item once, so long lists sort quickly.
-void sortItems(std::vector<std::string>& items);
-
 // Texts kept in the list-box order, all in one buffer: a list of 32,767 titles takes a few
 // allocations instead of one per title, and sorting it moves only where each text stands.
 class Items {

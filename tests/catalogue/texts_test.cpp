@@ -140,15 +140,13 @@ TEST(Latin1, FindIgnoreCase) {
 TEST(Latin1, ItemOrderPutsAPrefixFirst) {
     EXPECT_TRUE(itemLess("ab", "ABC") && !itemLess("ABC", "ab") && !itemLess("abc", "abc"));
     std::vector<std::string> items = {"ABC", "abc", "ab"};
-    sortItems(items);
-    EXPECT_EQ(items, (std::vector<std::string>{"ab", "ABC", "abc"}));
+    EXPECT_EQ(list_order::Items(items).strings(), (std::vector<std::string>{"ab", "ABC", "abc"}));
     // Long items alike in their first eight or sixteen bytes sort as one by one comparison would.
     items = {"The Long Road 2", "the long road 1", "THE LONG ROAD HOME b", "The Long Road Home A",
              "The Long Roa",    "the long road",   "The Long Road Home",   "THE LONG ROAD 1"};
     std::vector<std::string> expected = items;
     std::sort(expected.begin(), expected.end(), itemLess);
-    sortItems(items);
-    EXPECT_EQ(items, expected);
+    EXPECT_EQ(list_order::Items(items).strings(), expected);
 }
 
 // A long list box's items: sorted by their leading bytes' digits, then moved one at a time and
