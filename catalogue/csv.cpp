@@ -1,5 +1,8 @@
 #include "catalogue/csv.h"
 
+#include <bit>
+#include <cstring>
+
 #include "catalogue/byte_scan.h"
 
 namespace catalogue {
@@ -27,14 +30,64 @@ std::string csvRow(const std::vector<std::string>& fields) {
     return row;
 }
 
-std::size_t CsvReader::plainEnd(std::size_t from) const {
-    return findAnyOf<',', '\r', '\n'>(text_, from);
+namespace {
+
+// The commas and line ends among 64 bytes of a text, from `from` on; bytes past its end are
+// none. Most fields end within the 64 bytes in hand, so a row's fields are found in one word.
+struct Stops {
+    std::size_t from = 0;
+    std::uint64_t bits = 0;
+};
+
+Stops stopsAt(std::string_view text, std::size_t from) {
+    if (text.size() - from >= 64) return {from, stopBits64<',', '\r', '\n'>(text.data() + from)};
+    char padded[64] = {};
+    std::memcpy(padded, text.data() + from, text.size() - from);
+    return {from, stopBits64<',', '\r', '\n'>(padded)};
 }
 
-void CsvReader::skipLineEnd() {
-    if (text_[at_] == '\r' && at_ + 1 < text_.size() && text_[at_ + 1] == '\n') ++at_;
-    ++at_;
-    ++line_;
+struct Stop {
+    std::size_t at;
+    Stops stops;  // the stops in hand afterwards
+};
+
+// The first comma or line end at or after `from` when the stops in hand hold none there.
+[[gnu::noinline]] Stop stopAfter(std::string_view text, Stops stops, std::size_t from) {
+    const std::size_t size = text.size();
+    if (from >= size) return {size, stops};
+    if (from - stops.from >= 64) {
+        stops = stopsAt(text, from);
+        if (stops.bits != 0)
+            return {from + static_cast<std::size_t>(std::countr_zero(stops.bits)), stops};
+    }
+    for (;;) {
+        if (stops.from + 64 >= size) return {size, stops};
+        stops = stopsAt(text, stops.from + 64);
+        if (stops.bits != 0) {
+            return {stops.from + static_cast<std::size_t>(std::countr_zero(stops.bits)), stops};
+        }
+    }
+}
+
+// The first comma or line end at or after `from`, or the size. The stops are passed by value
+// and given back, so that they stay in registers while a row's fields are stored.
+[[gnu::always_inline]] inline std::size_t plainEnd(std::string_view text, Stops& stops,
+                                                   std::size_t from) {
+    const std::size_t offset = from - stops.from;  // unsigned: a `from` before them is far off
+    if (offset < 64) {
+        if (const std::uint64_t bits = stops.bits >> offset; bits != 0) {
+            return from + static_cast<std::size_t>(std::countr_zero(bits));
+        }
+    }
+    const Stop stop = stopAfter(text, stops, from);
+    stops = stop.stops;
+    return stop.at;
+}
+
+}  // namespace
+
+CsvReader::CsvReader(std::string_view text) : text_(text) {
+    if (!text_.empty()) stops_ = stopsAt(text_, 0).bits;
 }
 
 std::string_view CsvReader::quotedField() {
@@ -72,7 +125,10 @@ std::string_view CsvReader::quotedField() {
         at_ = i + 1;
         break;
     }
-    const std::size_t end = plainEnd(at_);
+    Stops stops{stopsFrom_, stops_};
+    const std::size_t end = plainEnd(text_, stops, at_);
+    stopsFrom_ = stops.from;
+    stops_ = stops.bits;
     if (kept == std::string::npos && end == at_) return piece;
     keep(piece);
     keep(text_.substr(at_, end - at_));
@@ -81,29 +137,48 @@ std::string_view CsvReader::quotedField() {
 }
 
 bool CsvReader::next() {
-    while (at_ < text_.size() && (text_[at_] == '\r' || text_[at_] == '\n')) {
-        skipLineEnd();  // an empty line
-    }
-    if (at_ >= text_.size()) return false;
+    // Kept in locals while the fields are stored, which the compiler could not tell apart
+    // from the reader's own members.
+    const std::string_view text = text_;
+    const std::size_t size = text.size();
+    std::size_t at = at_;
+    // Skips the line end at `at`: CR LF, CR or LF.
+    auto lineEnd = [&] {
+        if (text[at] == '\r' && at + 1 < size && text[at + 1] == '\n') ++at;
+        ++at;
+        ++line_;
+    };
+    while (at < size && (text[at] == '\r' || text[at] == '\n')) lineEnd();  // an empty line
+    at_ = at;
+    if (at >= size) return false;
     fields_.clear();
     unquoted_.clear();
     unclosedQuote_ = false;
     recordLine_ = line_;
-    recordStart_ = at_;
+    recordStart_ = at;
+    Stops stops{stopsFrom_, stops_};
     for (;;) {
-        if (at_ < text_.size() && text_[at_] == '"') {
+        if (at < size && text[at] == '"') {
+            at_ = at;
+            stopsFrom_ = stops.from;
+            stops_ = stops.bits;
             fields_.push_back(quotedField());
+            at = at_;
+            stops = {stopsFrom_, stops_};
         } else {
-            const std::size_t end = plainEnd(at_);
-            fields_.push_back(text_.substr(at_, end - at_));
-            at_ = end;
+            const std::size_t end = plainEnd(text, stops, at);
+            fields_.emplace_back(text.data() + at, end - at);
+            at = end;
         }
-        if (at_ < text_.size() && text_[at_] == ',') {
-            ++at_;
+        if (at < size && text[at] == ',') {
+            ++at;
             continue;
         }
-        recordEnd_ = at_;
-        if (at_ < text_.size()) skipLineEnd();
+        recordEnd_ = at;
+        if (at < size) lineEnd();
+        at_ = at;
+        stopsFrom_ = stops.from;
+        stops_ = stops.bits;
         return true;
     }
 }

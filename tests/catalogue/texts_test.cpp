@@ -205,6 +205,14 @@ TEST(Csv, ReaderGivesEveryFieldAndTheLineItStartsOn) {
         {"\"two\r\nlines\rthree\",z\n,\n\"open,\r\nend",
          "1:two\r\nlines\rthree|z <\"two\r\nlines\rthree\",z> 4:| <,> 5:open,\r\nend! "
          "<\"open,\r\nend> "},
+        // Commas and line ends are looked for 64 bytes at a time: fields that end on the last
+        // byte of such a stretch and start on the first of the next, one longer than two of
+        // them, and a quoted field on the first byte of a stretch.
+        {std::string(63, 'a') + ",b," + std::string(130, 'c') + ",d\r\n" + std::string(55, 'e') +
+             ",\"q\"\"\"x",
+         "1:" + std::string(63, 'a') + "|b|" + std::string(130, 'c') + "|d <" +
+             std::string(63, 'a') + ",b," + std::string(130, 'c') +
+             ",d> 2:" + std::string(55, 'e') + "|q\"x <" + std::string(55, 'e') + ",\"q\"\"\"x> "},
     };
     for (const auto& c : cases) {
         std::string records;
