@@ -3,6 +3,10 @@
 #include <cstdint>
 #include <cstring>
 
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
+
 namespace catalogue {
 
 std::string latin1ToUtf8(std::string_view latin1) {
@@ -56,9 +60,17 @@ std::optional<char32_t> decodeOne(std::string_view bytes, std::size_t& at) {
     return code;
 }
 
-// The first byte at or after `at` that is not ASCII, or the size. Reads eight bytes at a time:
-// most of the text is ASCII.
+// The first byte at or after `at` that is not ASCII, or the size. Reads 32 bytes (or eight) at a
+// time: most of the text is ASCII.
 std::size_t asciiEnd(std::string_view bytes, std::size_t at) {
+#if defined(__SSE2__)
+    for (; at + 32 <= bytes.size(); at += 32) {
+        const auto* block = reinterpret_cast<const __m128i*>(bytes.data() + at);
+        if (_mm_movemask_epi8(_mm_or_si128(_mm_loadu_si128(block), _mm_loadu_si128(block + 1)))) {
+            break;
+        }
+    }
+#endif
     constexpr std::uint64_t kHighBits = 0x8080808080808080u;
     for (; at + 8 <= bytes.size(); at += 8) {
         std::uint64_t word;
@@ -82,22 +94,29 @@ bool isUtf8(std::string_view bytes) {
     return true;
 }
 
-bool appendAsLatin1(std::string& out, std::string_view utf8, char32_t* outside) {
-    const std::size_t before = out.size();
+char* writeAsLatin1(char* to, std::string_view utf8, char32_t* outside) {
     for (std::size_t at = 0; at < utf8.size();) {
         const std::size_t ascii = asciiEnd(utf8, at);
-        out.append(utf8.substr(at, ascii - at));
+        if (ascii > at) std::memcpy(to, utf8.data() + at, ascii - at);
+        to += ascii - at;
         at = ascii;
         if (at == utf8.size()) break;
         const std::optional<char32_t> code = decodeOne(utf8, at);
         if (!code || *code > 0xFF) {
             if (outside != nullptr) *outside = code.value_or(0xFFFD);
-            out.resize(before);
-            return false;
+            return nullptr;
         }
-        out.push_back(static_cast<char>(*code));
+        *to++ = static_cast<char>(*code);
     }
-    return true;
+    return to;
+}
+
+bool appendAsLatin1(std::string& out, std::string_view utf8, char32_t* outside) {
+    const std::size_t before = out.size();
+    out.resize(before + utf8.size());
+    char* const end = writeAsLatin1(out.data() + before, utf8, outside);
+    out.resize(end == nullptr ? before : static_cast<std::size_t>(end - out.data()));
+    return end != nullptr;
 }
 
 std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside) {

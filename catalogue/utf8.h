@@ -21,6 +21,11 @@ bool isUtf8(std::string_view bytes);
 // U+00FF; `outside` then receives that character's code point.
 std::optional<std::string> utf8ToLatin1(std::string_view utf8, char32_t* outside = nullptr);
 
+// Writes the ISO-8859-1 bytes of well-formed UTF-8 text to `to`, which has room for as many
+// bytes as `utf8` holds, and returns the end of what it wrote. Nothing when the text holds a
+// character above U+00FF: `outside` then receives that code point.
+char* writeAsLatin1(char* to, std::string_view utf8, char32_t* outside = nullptr);
+
 // Appends the ISO-8859-1 bytes of well-formed UTF-8 text to `out`. False when it holds a
 // character above U+00FF: `out` is then as it was, and `outside` receives that code point.
 bool appendAsLatin1(std::string& out, std::string_view utf8, char32_t* outside = nullptr);
