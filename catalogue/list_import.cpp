@@ -6,6 +6,7 @@
 #include <cstring>
 #include <optional>
 
+#include "catalogue/article_numbers.h"
 #include "catalogue/byte_scan.h"
 #include "catalogue/catalogue_error.h"
 #include "catalogue/csv.h"
@@ -14,6 +15,7 @@
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
 #include "catalogue/title_set.h"
+#include "catalogue/utf8.h"
 
 namespace catalogue {
 
@@ -44,6 +46,15 @@ std::optional<std::string> listedName(std::string_view index, std::string_view l
     return std::nullopt;
 }
 
+// The letter each first character files under, looked up once per row.
+const std::array<char, 256> kLetters = [] {
+    std::array<char, 256> letters{};
+    for (std::size_t c = 0; c < letters.size(); ++c) {
+        letters[c] = articleLetter(static_cast<char>(c));
+    }
+    return letters;
+}();
+
 // Article numbers handed out row after row. The first number of each letter goes through
 // handOutNumber(), which also says why a letter has none left; later ones are counted here and
 // written into the counter text once, at the end.
@@ -55,9 +66,15 @@ class Counters {
     // Writes the next number for a title's first character to `number`; false and the reason in
     // `refusal` when its letter has none left. Throws CatalogueError for a damaged record.
     bool handOut(char firstCharacter, char (&number)[4], std::string& refusal) {
-        const char letter = articleLetter(firstCharacter);
+        const char letter = kLetters[static_cast<unsigned char>(firstCharacter)];
         Letter& l = letters_[letter == '!' ? 26 : letter - 'A'];
-        if (l.state == State::Counting && l.next == 0) {
+        if (l.state == State::Counting) {
+            if (std::memcmp(l.next, "000", 3) != 0) {
+                number[0] = letter;
+                std::memcpy(number + 1, l.next, 3);
+                advance(l.next);
+                return true;
+            }
             flush();  // used up here: the text says so, and handOutNumber() words the refusal
             l.state = State::Unused;
         }
@@ -65,26 +82,19 @@ class Counters {
             refusal = l.refusal;
             return false;
         }
-        if (l.state == State::Unused) {
-            std::optional<ArticleNumberResult> next =
-                handOutNumber(text_, file_, firstCharacter, refusal);
-            if (!next) {
-                l.state = State::Refused;
-                l.refusal = refusal;
-                return false;
-            }
-            text_ = std::move(next->counterText);
-            std::memcpy(number, next->number.data(), 4);
-            // The letter's record is the first occurrence of the letter; its digits follow "#".
-            l.digits = text_.find(letter) + 2;
-            l.next = (text_[l.digits] - '0') * 100 + (text_[l.digits + 1] - '0') * 10 +
-                     (text_[l.digits + 2] - '0');
-            l.state = State::Counting;
-            return true;
+        std::optional<ArticleNumberResult> next =
+            handOutNumber(text_, file_, firstCharacter, refusal);
+        if (!next) {
+            l.state = State::Refused;
+            l.refusal = refusal;
+            return false;
         }
-        number[0] = letter;
-        writeDigits(number + 1, l.next);
-        l.next = (l.next + 1) % 1000;  // 999 -> "000": used up
+        text_ = std::move(next->counterText);
+        std::memcpy(number, next->number.data(), 4);
+        // The letter's record is the first occurrence of the letter; its digits follow "#".
+        l.digits = text_.find(letter) + 2;
+        std::memcpy(l.next, text_.data() + l.digits, 3);
+        l.state = State::Counting;
         return true;
     }
 
@@ -99,20 +109,25 @@ class Counters {
     struct Letter {
         State state = State::Unused;
         std::size_t digits = 0;  // where the record's three digits stand in the text
-        int next = 0;
+        char next[3] = {};       // the digits of the next number to hand out
         std::string refusal;
     };
 
-    static void writeDigits(char* to, int value) {
-        to[0] = static_cast<char>('0' + value / 100);
-        to[1] = static_cast<char>('0' + value / 10 % 10);
-        to[2] = static_cast<char>('0' + value % 10);
+    // Counts three digits on by one; 999 goes to "000", which marks the letter used up.
+    static void advance(char (&digits)[3]) {
+        for (int i = 2; i >= 0; --i) {
+            if (digits[i] != '9') {
+                ++digits[i];
+                return;
+            }
+            digits[i] = '0';
+        }
     }
 
     // Writes the counted numbers into the text. Digits never hold a letter, so no record moves.
     void flush() {
         for (const Letter& l : letters_) {
-            if (l.state == State::Counting) writeDigits(text_.data() + l.digits, l.next);
+            if (l.state == State::Counting) std::memcpy(text_.data() + l.digits, l.next, 3);
         }
     }
 
@@ -129,20 +144,54 @@ ByteKinds rowKinds(std::string_view row) {
     return byteKinds<'\r', '\n', '<', '#'>(row);
 }
 
+// Bytes that may be read sixteen at a time from any place up to sixteen before their end.
+struct Readable {
+    std::uintptr_t begin = 0;
+    std::size_t places = 0;  // how many places a sixteen-byte read may start at
+
+    explicit Readable(std::string_view bytes)
+        : begin(reinterpret_cast<std::uintptr_t>(bytes.data())),
+          places(bytes.size() >= 16 ? bytes.size() - 15 : 0) {}
+    bool holds16(const char* at) const {
+        return reinterpret_cast<std::uintptr_t>(at) - begin < places;  // unsigned: also below
+    }
+};
+
 // A text filled from its front: room for a row is made once, and its pieces are then copied in
 // without the checks of one append each. The bytes past `used` are spare.
 struct Filling {
+    // A short piece is copied sixteen bytes at once; the room keeps that many spare past it.
+    static constexpr std::size_t kSpare = 16;
+
     std::string text;
     std::size_t used = 0;
 
     char* room(std::size_t bytes) {
-        if (text.size() < used + bytes) text.resize(std::max(text.size() * 2, used + bytes));
+        if (text.size() - used < bytes + kSpare) grow(bytes + kSpare);
         return text.data() + used;
     }
-    static char* put(char* to, std::string_view piece) {
-        if (piece.empty()) return to;  // an empty field may have no bytes to point at
-        std::memcpy(to, piece.data(), piece.size());
-        return to + piece.size();
+    // Within the capacity reserved, the text is lengthened a stretch at a time, so that room
+    // reserved and never needed is never written.
+    [[gnu::noinline]] void grow(std::size_t bytes) {
+        const std::size_t needed = used + bytes;
+        if (needed > text.capacity()) text.reserve(std::max(needed, text.capacity() * 2));
+        text.resize(std::max(needed, std::min(text.capacity(), text.size() + 65536)));
+    }
+    // Copies a piece to `to`. One of up to sixteen bytes in `from` is copied in one move, which
+    // writes up to sixteen bytes past it into the spare room.
+    static char* put(char* to, std::string_view piece, const Readable& from) {
+        const std::size_t size = piece.size();
+        if (size <= 16 && from.holds16(piece.data())) {
+            std::memcpy(to, piece.data(), 16);
+        } else if (size > 0) {  // an empty field may have no bytes to point at
+            std::memcpy(to, piece.data(), size);
+        }
+        return to + size;
+    }
+    template <std::size_t N>
+    static char* put(char* to, const char (&bytes)[N]) {
+        std::memcpy(to, bytes, N - 1);
+        return to + N - 1;
     }
     std::string done() && {
         text.resize(used);
@@ -157,12 +206,14 @@ struct Growing {
         const std::string_view text(entries.text);
         std::size_t lines = 0;
         for (std::size_t at = 0; at < text.size(); ++lines) {
-            const Line line = lineAt(text, at);
+            const std::size_t cr = findAnyOf<'\r'>(text, at);
             if (lines % 4 == 0) {
-                titles.look(line.text.substr(std::min<std::size_t>(3, line.text.size())));
-                if (!titles.holds()) titles.add();
+                const std::size_t from = std::min(at + 3, cr);
+                titles.look(text.substr(from, cr - from), from + 16 <= text.size());
+                if (!titles.holds(text)) titles.add(from);
             }
-            at = line.next;
+            at = cr + 1;
+            if (at < text.size() && text[at] == '\n') ++at;
         }
         count = lines / 4;
         return lines % 4 == 0;
@@ -172,41 +223,60 @@ struct Growing {
     // written straight into `entries`, and count only once the row is taken in.
     std::string addRow(const CsvReader& record) {
         if (record.unclosedQuote()) return "A quoted field is not closed before the file ends.";
-        static constexpr std::array<std::string_view, 4> kLineStarts = {"<|?", "\r\n<|'", "\r\n<||",
-                                                                        "\r\n<|*"};
         const ByteKinds kinds = rowKinds(record.raw());
         const bool decode = utf8 && kinds.high;
-        std::array<std::string_view, 4> fields;
+        // The fields are read through pointers, a word at a time: a view the reader has just
+        // stored in two words cannot be handed on to a load of both at once, which waits.
+        static constexpr std::string_view kNone;
+        const std::vector<std::string_view>& all = record.fields();
+        std::array<const std::string_view*, 4> fields;
         std::size_t bytes = 20;  // the line starts and the last line end
         for (std::size_t k = 0; k < fields.size(); ++k) {
-            if (column[k] && *column[k] < record.fields().size()) {
-                fields[k] = record.fields()[*column[k]];
-            }
-            bytes += fields[k].size();  // decoding from UTF-8 only ever shortens a field
+            fields[k] = column[k] < all.size() ? &all[column[k]] : &kNone;
+            bytes += fields[k]->size();  // decoding from UTF-8 only ever shortens a field
         }
-        char* const out = entries.room(bytes);
-        char* to = out;
+        // A title stored as it stands in the row is hashed there, so that its place in the
+        // table is fetched while the row is copied.
+        if (!decode) titles.look(*fields[0], csv.holds16(fields[0]->data()));
+        char* to = entries.room(bytes);
         std::array<std::string_view, 4> values;
-        for (std::size_t k = 0; k < kLineStarts.size(); ++k) {
-            std::string_view raw = fields[k];
-            to = Filling::put(to, kLineStarts[k]);
+        std::size_t failed = 0;  // the first field with a character Latin-1 cannot hold, from 1
+        char32_t outside = 0;
+        // Each field as it stands in the row, or from UTF-8 when the row reads differently so.
+        auto field = [&](std::size_t k) {
+            char* const start = to;
             if (decode) {
-                char32_t outside = 0;
-                decoded_.clear();
-                if (!appendAsLatin1(decoded_, raw, &outside)) {
-                    return std::string("The ") + kFieldNames[k] + " holds the character " +
-                           codePoint(outside) +
-                           ", which the list's files cannot store (they hold Latin-1 only).";
+                char32_t code = 0;
+                to = writeAsLatin1(to, *fields[k], &code);
+                if (to == nullptr) {
+                    if (failed == 0) {
+                        failed = k + 1;
+                        outside = code;
+                    }
+                    to = start;
                 }
-                raw = decoded_;
+            } else {
+                to = Filling::put(to, *fields[k], csv);
             }
-            values[k] = {to, raw.size()};
-            to = Filling::put(to, raw);
-            if (k == 0) titles.look(values[0]);
+            values[k] = {start, static_cast<std::size_t>(to - start)};
+        };
+        to = Filling::put(to, "<|?");
+        field(0);
+        to = Filling::put(to, "\r\n<|'");
+        field(1);
+        to = Filling::put(to, "\r\n<||");
+        field(2);
+        to = Filling::put(to, "\r\n<|*");
+        field(3);
+        to = Filling::put(to, "\r\n");
+        if (failed != 0) {
+            return std::string("The ") + kFieldNames[failed - 1] + " holds the character " +
+                   codePoint(outside) +
+                   ", which the list's files cannot store (they hold Latin-1 only).";
         }
-        to = Filling::put(to, kCrLf);
+        if (decode) titles.look(values[0], Readable(entries.text).holds16(values[0].data()));
         std::string refusal = takeIn(kinds.stop || values[0].empty(), values);
-        if (refusal.empty()) entries.used += static_cast<std::size_t>(to - out);
+        if (refusal.empty()) entries.used = static_cast<std::size_t>(to - entries.text.data());
         return refusal;
     }
 
@@ -219,31 +289,30 @@ struct Growing {
             if (!refusal.empty()) return refusal;
         }
         const std::string_view title = values[0];
-        if (titles.holds() && title != " ") return kDuplicateTitle;
+        if (titles.holds(entries.text) && title != " ") return kDuplicateTitle;
         if (count >= static_cast<std::size_t>(kMaxEntries)) return kListFull;
         char number[4];
         std::string refusal;
         if (!counters.handOut(title.front(), number, refusal)) return refusal;
         char* to = articles.room(title.size() + kArticleSeparator.size() + 4 + kCrLf.size());
-        to = Filling::put(to, title);
-        to = Filling::put(to, kArticleSeparator);
-        to = Filling::put(to, {number, 4});
-        to = Filling::put(to, kCrLf);
+        to = Filling::put(to, title, Readable(entries.text));
+        to = Filling::put(to, "#*\\");
+        std::memcpy(to, number, 4);
+        to = Filling::put(to + 4, "\r\n");
         articles.used = static_cast<std::size_t>(to - articles.text.data());
-        titles.add();
+        titles.add(static_cast<std::size_t>(title.data() - entries.text.data()));
         ++count;
         return {};
     }
 
-    std::array<std::optional<std::size_t>, 4> column;  // title, type, discs, information
+    // Where the title, type, discs and information stand in a record; npos for none.
+    std::array<std::size_t, 4> column;
     bool utf8 = false;
+    Readable csv{{}};  // the CSV file's bytes, which the fields are read from
     Filling entries, articles;
     Counters counters;
     import_titles::TitleSet titles;
     std::size_t count = 0;
-
-  private:
-    std::string decoded_;  // a field of a UTF-8 row in Latin-1
 };
 
 }  // namespace
@@ -271,7 +340,9 @@ ImportResult importCsv(Store& store, const std::string& list, std::string_view c
 
     const std::string index = store.readText(kIndexFile);
     Growing g;
-    g.column = column;
+    for (std::size_t k = 0; k < column.size(); ++k) {
+        g.column[k] = column[k].value_or(std::string_view::npos);
+    }
     if (std::optional<std::string> name = listedName(index, list)) {
         result.list = *name;
         g.entries.text = toFileText(store.readBytes(entryFile(result.list)));
@@ -297,10 +368,16 @@ ImportResult importCsv(Store& store, const std::string& list, std::string_view c
     }
     g.utf8 = isUtf8(csvBytes);
 
-    // A row's lines take its fields and about twenty bytes more; rows are rarely shorter than 40.
+    g.csv = Readable(csvBytes);
+
+    // The rows' fields are parts of the file, and a row's lines take twenty bytes more: with
+    // room for every row the list can take, the entry text is never moved while it fills.
+    const std::size_t rows = static_cast<std::size_t>(kMaxEntries) + 1 -
+                             std::min(g.count, static_cast<std::size_t>(kMaxEntries));
     g.titles.reserve(std::min(g.count + csvBytes.size() / 16, std::size_t{kMaxEntries}));
-    g.entries.room(csvBytes.size() + csvBytes.size() / 2);
-    g.articles.room(csvBytes.size() / 2);
+    g.entries.text.reserve(g.entries.used + csvBytes.size() + 20 * rows + Filling::kSpare);
+    g.articles.text.reserve(g.articles.used + csvBytes.size() / 4 * 3 +
+                            9 * std::min(rows, csvBytes.size() / 4));
     while (reader.next()) {
         std::string refusal = g.addRow(reader);
         if (refusal.empty()) {

@@ -1,12 +1,14 @@
 #pragma once
 
 #include <algorithm>
-#include <array>
 #include <cstdint>
 #include <cstring>
-#include <string>
 #include <string_view>
 #include <vector>
+
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
 
 #include "catalogue/latin1.h"
 
@@ -14,9 +16,10 @@
 // the rows taken in so far.
 namespace catalogue::import_titles {
 
-// The titles of a list folded, each kept once in one text and found through open addressing,
-// so that a title costs no allocation of its own. A slot is eight bytes (part of the hash, and
-// which title), so the table of a full list stays in the processor's cache.
+// The titles of a list, found through open addressing on a hash of their folded bytes. The set
+// keeps no copy of a title: it notes where the title stands in the list's entry text, which the
+// caller keeps and hands in to compare. A slot is eight bytes (part of the hash, and which
+// title), so the table of a full list stays in the processor's cache.
 class TitleSet {
   public:
     // Room for `expected` titles without growing.
@@ -24,72 +27,99 @@ class TitleSet {
         std::size_t size = 1024;
         while (size < expected * 2) size *= 2;
         if (size > slots_.size()) rehash(size);
+        places_.reserve(expected);
     }
 
-    // Folds `title` and fetches its place in the table, which holds() then looks at: the fetch
-    // goes on while the caller does other work.
-    void look(std::string_view title) {
+    // Hashes `title` folded and fetches its place in the table, which holds() then looks at: the
+    // fetch goes on while the caller does other work. `readAhead`: sixteen bytes from the
+    // title's start may be read, however short it is. The title must stay until add().
+    void look(std::string_view title, bool readAhead) {
         if (slots_.empty()) rehash(1024);
-        const std::size_t used = starts_.back();
-        // Bytes past the last title are spare room for the next.
-        if (keys_.size() < used + title.size() + 8) {
-            keys_.resize(std::max(keys_.size() * 2, used + title.size() + 4096));
-        }
-        char* const key = keys_.data() + used;
-        for (std::size_t i = 0; i < title.size(); ++i) {
-            key[i] =
-                static_cast<char>(list_order::kFoldTable[static_cast<unsigned char>(title[i])]);
-        }
-        length_ = title.size();
-        tag_ = hashOf(key, length_);
+        title_ = title;
+        tag_ = hashOf(title, readAhead);
         __builtin_prefetch(&slots_[tag_ & (slots_.size() - 1)]);
     }
 
-    // Whether the set holds the title last given to look(), ignoring case. When it does not,
-    // add() takes it in.
-    bool holds() {
-        const char* const key = keys_.data() + starts_.back();
+    // Whether the set holds the title last given to look(), ignoring case; `text` is the one
+    // the titles taken in stand in. When it does not, add() takes the title in.
+    bool holds(std::string_view text) {
         const std::size_t mask = slots_.size() - 1;
         for (slot_ = tag_ & mask; slots_[slot_] != 0; slot_ = (slot_ + 1) & mask) {
             const std::uint64_t s = slots_[slot_];
             if (s >> 32 != tag_) continue;
-            const std::size_t other = (s & 0xFFFFFFFFu) - 1;
-            const std::size_t start = starts_[other];
-            if (starts_[other + 1] - start == length_ &&
-                std::memcmp(keys_.data() + start, key, length_) == 0) {
-                return true;
-            }
+            const Place& other = places_[(s & 0xFFFFFFFFu) - 1];
+            if (equalsIgnoreCase(text.substr(other.at, other.size), title_)) return true;
         }
         return false;
     }
 
-    // Takes in the title that holds() last looked for and did not find.
-    void add() {
+    // Takes in the title that holds() last looked for and did not find; it stands at `at` in
+    // the text holds() is given.
+    void add(std::size_t at) {
         // Titles are counted in 32 bits: a list's files would need far more memory than there
         // is to hold 2^32 of them.
-        slots_[slot_] = std::uint64_t{tag_} << 32 | static_cast<std::uint32_t>(starts_.size());
-        starts_.push_back(starts_.back() + length_);
-        if (starts_.size() * 2 > slots_.size()) rehash(slots_.size() * 2);
+        places_.push_back({at, title_.size()});
+        slots_[slot_] = std::uint64_t{tag_} << 32 | static_cast<std::uint32_t>(places_.size());
+        if (places_.size() * 2 > slots_.size()) rehash(slots_.size() * 2);
     }
 
   private:
-    // Mixes a folded title in eight bytes at a time. The eight bytes after the title must be
-    // readable: look() keeps them spare.
-    static std::uint32_t hashOf(const char* key, std::size_t length) {
-        std::uint64_t h = 0x9E3779B97F4A7C15u ^ length;
-        std::size_t i = 0;
-        for (; i + 8 <= length; i += 8) {
-            std::uint64_t word;
-            std::memcpy(&word, key + i, 8);
-            h = (h ^ word) * 0xBF58476D1CE4E5B9u;
-            h ^= h >> 29;
+    struct Place {
+        std::size_t at, size;
+    };
+
+    // Folds sixteen bytes as foldByte() does (A-Z and the accented capitals 0xC0-0xDE except
+    // 0xD7 get 0x20 added), keeping the first `keep` of them and clearing the others.
+    static void fold16(const char* from, std::size_t keep, unsigned char (&to)[16]) {
+#if defined(__SSE2__)
+        static constexpr unsigned char kKeep[32] = {0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF,
+                                                    0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF};
+        const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(from));
+        // Shifted so that each range starts at -128, where one signed comparison bounds it.
+        const __m128i latin =
+            _mm_cmplt_epi8(_mm_sub_epi8(v, _mm_set1_epi8(0x40)), _mm_set1_epi8(-128 + 31));
+        const __m128i ascii =
+            _mm_cmplt_epi8(_mm_add_epi8(v, _mm_set1_epi8(static_cast<char>(0x80 - 'A'))),
+                           _mm_set1_epi8(-128 + 26));
+        const __m128i times = _mm_cmpeq_epi8(v, _mm_set1_epi8(static_cast<char>(0xD7)));
+        const __m128i upper = _mm_andnot_si128(times, _mm_or_si128(latin, ascii));
+        const __m128i folded = _mm_add_epi8(v, _mm_and_si128(upper, _mm_set1_epi8(0x20)));
+        const __m128i kept = _mm_loadu_si128(reinterpret_cast<const __m128i*>(kKeep + 16 - keep));
+        _mm_storeu_si128(reinterpret_cast<__m128i*>(to), _mm_and_si128(folded, kept));
+#else
+        for (std::size_t i = 0; i < 16; ++i) {
+            to[i] = i < keep ? list_order::kFoldTable[static_cast<unsigned char>(from[i])] : 0;
         }
-        std::uint64_t last;
-        std::memcpy(&last, key + i, 8);
-        const std::size_t rest = length - i;  // 0 to 7 bytes of the title, the rest spare
-        last = rest == 0 ? 0 : last & (~std::uint64_t{0} >> (64 - 8 * rest));
-        h = (h ^ last) * 0x94D049BB133111EBu;
-        return static_cast<std::uint32_t>(h ^ h >> 32);
+#endif
+    }
+
+    // Mixes a title in folded, sixteen bytes at a time; the last sixteen of a longer title
+    // overlap the block before them, a shorter one is padded with zero bytes.
+    static std::uint32_t hashOf(std::string_view title, bool readAhead) {
+        const char* const bytes = title.data();
+        const std::size_t size = title.size();
+        std::uint64_t h = 0x9E3779B97F4A7C15u ^ size;
+        auto mix = [&h](const char* block, std::size_t keep) {
+            unsigned char folded[16];
+            fold16(block, keep, folded);
+            std::uint64_t low, high;
+            std::memcpy(&low, folded, 8);
+            std::memcpy(&high, folded + 8, 8);
+            h = (h ^ low) * 0xBF58476D1CE4E5B9u;
+            h = (h ^ (h >> 29) ^ high) * 0x94D049BB133111EBu;
+            h ^= h >> 32;
+        };
+        if (size >= 16) {
+            for (std::size_t i = 0; i + 16 < size; i += 16) mix(bytes + i, 16);
+            mix(bytes + size - 16, 16);
+        } else if (size > 0 && readAhead) {
+            mix(bytes, size);
+        } else {
+            char padded[16] = {};
+            if (size > 0) std::memcpy(padded, bytes, size);
+            mix(padded, size);
+        }
+        return static_cast<std::uint32_t>(h);
     }
 
     void rehash(std::size_t size) {
@@ -104,10 +134,10 @@ class TitleSet {
         }
     }
 
-    std::string keys_;  // the folded titles one after another, the one looked for, spare room
-    std::vector<std::size_t> starts_ = {0};  // where each title starts in keys_, and the end
-    std::vector<std::uint64_t> slots_;       // hash << 32 | title + 1; 0 when free
-    std::size_t slot_ = 0, length_ = 0;      // the title last looked for
+    std::vector<Place> places_;         // where each title taken in stands, and its size
+    std::vector<std::uint64_t> slots_;  // hash << 32 | title + 1; 0 when free
+    std::string_view title_;            // the title last looked for
+    std::size_t slot_ = 0;
     std::uint32_t tag_ = 0;
 };
 

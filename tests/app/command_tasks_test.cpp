@@ -87,11 +87,17 @@ TEST_F(Commands, ImportAddsEachRowAsAddWouldOrSaysWhyNot) {
          {{{"Caf\xE9", "", "", "na\xEFve"}, "C001"}},
          "C#002\r\n",
          {}},
-        {"title\r\nCaf\xE9\r\n\xC9t\xE9\r\n",
-         0,
-         {{{"Caf\xE9", "", "", ""}, "C001"}, {{"\xC9t\xE9", "", "", ""}, "!001"}},
-         "C#002\r\n!#002\r\n",
-         {}},
+        // Latin-1, and titles alike but for the case of accented letters, short and past the
+        // sixteenth byte.
+        {"title\r\nCaf\xE9\r\n\xC9t\xE9\r\n\xE9T\xC9\r\nLive at the Caf\xE9 Royal\r\n"
+         "LIVE AT THE CAF\xC9 ROYAL\r\n",
+         3,
+         {{{"Caf\xE9", "", "", ""}, "C001"},
+          {{"\xC9t\xE9", "", "", ""}, "!001"},
+          {{"Live at the Caf\xE9 Royal", "", "", ""}, "L001"}},
+         "C#002\r\n!#002\r\nL#002\r\n",
+         {"4: " + std::string(catalogue::kDuplicateTitle),
+          "6: " + std::string(catalogue::kDuplicateTitle)}},
         {"title,type\r\nabba "
          "gold,x\r\n\"two\r\nlines\",y\r\nbad<|?,z\r\n\xE2\x82\xAC,u\r\n,empty\r\n"
          "New,ok\r\nNEW,dup\r\nQueen,q\r\n\"open,\r\n",
