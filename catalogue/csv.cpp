@@ -32,62 +32,45 @@ std::string csvRow(const std::vector<std::string>& fields) {
 
 namespace {
 
-// The commas and line ends among 64 bytes of a text, from `from` on; bytes past its end are
-// none. Most fields end within the 64 bytes in hand, so a row's fields are found in one word.
-struct Stops {
-    std::size_t from = 0;
-    std::uint64_t bits = 0;
-};
-
-Stops stopsAt(std::string_view text, std::size_t from) {
-    if (text.size() - from >= 64) return {from, stopBits64<',', '\r', '\n'>(text.data() + from)};
+// The commas and line ends among the 64 bytes of a text from `from` on, bit 0 for the first;
+// bytes past its end are none.
+std::uint64_t stopsAt(std::string_view text, std::size_t from) {
+    if (text.size() - from >= 64) return stopBits64<',', '\r', '\n'>(text.data() + from);
     char padded[64] = {};
     std::memcpy(padded, text.data() + from, text.size() - from);
-    return {from, stopBits64<',', '\r', '\n'>(padded)};
+    return stopBits64<',', '\r', '\n'>(padded);
 }
 
-struct Stop {
-    std::size_t at;
-    Stops stops;  // the stops in hand afterwards
-};
-
-// The first comma or line end at or after `from` when the stops in hand hold none there.
-[[gnu::noinline]] Stop stopAfter(std::string_view text, Stops stops, std::size_t from) {
-    const std::size_t size = text.size();
-    if (from >= size) return {size, stops};
-    if (from - stops.from >= 64) {
-        stops = stopsAt(text, from);
-        if (stops.bits != 0)
-            return {from + static_cast<std::size_t>(std::countr_zero(stops.bits)), stops};
-    }
-    for (;;) {
-        if (stops.from + 64 >= size) return {size, stops};
-        stops = stopsAt(text, stops.from + 64);
-        if (stops.bits != 0) {
-            return {stops.from + static_cast<std::size_t>(std::countr_zero(stops.bits)), stops};
-        }
-    }
-}
-
-// The first comma or line end at or after `from`, or the size. The stops are passed by value
-// and given back, so that they stay in registers while a row's fields are stored.
-[[gnu::always_inline]] inline std::size_t plainEnd(std::string_view text, Stops& stops,
-                                                   std::size_t from) {
-    const std::size_t offset = from - stops.from;  // unsigned: a `from` before them is far off
+// The first comma or line end at or after `from`, or the size. Most fields end within the 64
+// bytes whose stops are in hand (`stops` for those from `stopsFrom` on), so a row's fields are
+// found in one word; the word is read anew only when it holds no further stop.
+[[gnu::always_inline]] inline std::size_t plainEnd(std::string_view text, std::size_t& stopsFrom,
+                                                   std::uint64_t& stops, std::size_t from) {
+    const std::size_t offset = from - stopsFrom;  // unsigned: a `from` before them is far off
     if (offset < 64) {
-        if (const std::uint64_t bits = stops.bits >> offset; bits != 0) {
+        if (const std::uint64_t bits = stops >> offset; bits != 0) {
             return from + static_cast<std::size_t>(std::countr_zero(bits));
         }
     }
-    const Stop stop = stopAfter(text, stops, from);
-    stops = stop.stops;
-    return stop.at;
+    const std::size_t size = text.size();
+    if (from >= size) return size;
+    if (offset >= 64) {
+        stopsFrom = from;
+        stops = stopsAt(text, from);
+        if (stops != 0) return from + static_cast<std::size_t>(std::countr_zero(stops));
+    }
+    for (;;) {
+        stopsFrom += 64;
+        if (stopsFrom >= size) return size;
+        stops = stopsAt(text, stopsFrom);
+        if (stops != 0) return stopsFrom + static_cast<std::size_t>(std::countr_zero(stops));
+    }
 }
 
 }  // namespace
 
 CsvReader::CsvReader(std::string_view text) : text_(text) {
-    if (!text_.empty()) stops_ = stopsAt(text_, 0).bits;
+    if (!text_.empty()) stops_ = stopsAt(text_, 0);
 }
 
 std::string_view CsvReader::quotedField() {
@@ -125,10 +108,7 @@ std::string_view CsvReader::quotedField() {
         at_ = i + 1;
         break;
     }
-    Stops stops{stopsFrom_, stops_};
-    const std::size_t end = plainEnd(text_, stops, at_);
-    stopsFrom_ = stops.from;
-    stops_ = stops.bits;
+    const std::size_t end = plainEnd(text_, stopsFrom_, stops_, at_);
     if (kept == std::string::npos && end == at_) return piece;
     keep(piece);
     keep(text_.substr(at_, end - at_));
@@ -156,17 +136,19 @@ bool CsvReader::next() {
     unclosedQuote_ = false;
     recordLine_ = line_;
     recordStart_ = at;
-    Stops stops{stopsFrom_, stops_};
+    std::size_t stopsFrom = stopsFrom_;
+    std::uint64_t stops = stops_;
     for (;;) {
         if (at < size && text[at] == '"') {
             at_ = at;
-            stopsFrom_ = stops.from;
-            stops_ = stops.bits;
+            stopsFrom_ = stopsFrom;
+            stops_ = stops;
             fields_.push_back(quotedField());
             at = at_;
-            stops = {stopsFrom_, stops_};
+            stopsFrom = stopsFrom_;
+            stops = stops_;
         } else {
-            const std::size_t end = plainEnd(text, stops, at);
+            const std::size_t end = plainEnd(text, stopsFrom, stops, at);
             fields_.emplace_back(text.data() + at, end - at);
             at = end;
         }
@@ -177,8 +159,8 @@ bool CsvReader::next() {
         recordEnd_ = at;
         if (at < size) lineEnd();
         at_ = at;
-        stopsFrom_ = stops.from;
-        stops_ = stops.bits;
+        stopsFrom_ = stopsFrom;
+        stops_ = stops;
         return true;
     }
 }

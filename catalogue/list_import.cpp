@@ -275,14 +275,19 @@ struct Growing {
                    ", which the list's files cannot store (they hold Latin-1 only).";
         }
         if (decode) titles.look(values[0], Readable(entries.text).holds16(values[0].data()));
-        std::string refusal = takeIn(kinds.stop || values[0].empty(), values);
+        // The article line takes its title from the file where it stands there: bytes just
+        // stored into the entry text would be read back before they are written out.
+        std::string refusal =
+            takeIn(kinds.stop || values[0].empty(), values, decode ? values[0] : *fields[0],
+                   decode ? Readable(entries.text) : csv);
         if (refusal.empty()) entries.used = static_cast<std::size_t>(to - entries.text.data());
         return refusal;
     }
 
     // Numbers and counts an entry whose lines are written; why Add refuses it instead. The
     // entry checks run only when the row may hold something they refuse.
-    std::string takeIn(bool mayBeRefused, const std::array<std::string_view, 4>& values) {
+    std::string takeIn(bool mayBeRefused, const std::array<std::string_view, 4>& values,
+                       std::string_view titleBytes, const Readable& titleIn) {
         if (mayBeRefused) {
             std::string refusal = entryRefusal({std::string(values[0]), std::string(values[1]),
                                                 std::string(values[2]), std::string(values[3])});
@@ -295,7 +300,7 @@ struct Growing {
         std::string refusal;
         if (!counters.handOut(title.front(), number, refusal)) return refusal;
         char* to = articles.room(title.size() + kArticleSeparator.size() + 4 + kCrLf.size());
-        to = Filling::put(to, title, Readable(entries.text));
+        to = Filling::put(to, titleBytes, titleIn);
         to = Filling::put(to, "#*\\");
         std::memcpy(to, number, 4);
         to = Filling::put(to + 4, "\r\n");
