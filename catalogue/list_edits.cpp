@@ -105,21 +105,24 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
     // A change that keeps the title needs the article file only to give a title that lacks its
     // article line one; without the file it leaves articles alone.
     const bool sameTitle = entry.title == oldTitle;
-    const std::optional<std::string> articleText =
+    std::optional<std::string> articles =
         sameTitle ? t.readTextIfExists(articleName) : t.readText(articleName);
-    const std::string_view articles = articleText ? std::string_view(*articleText) : "";
-    const bool hasLine = findArticleLine(articles, oldTitle) != std::string::npos;
-    if (articleText && (!sameTitle || !hasLine)) {
+    // Looked for once; the article text is then edited where it was read.
+    const std::size_t line = articles ? findArticleLine(*articles, oldTitle) : std::string::npos;
+    const bool hasLine = line != std::string::npos;
+    if (articles && (!sameTitle || !hasLine)) {
         if (!hasLine || upperFirst(entry.title) != upperFirst(oldTitle)) {
             std::string words;
             std::optional<std::string> number =
                 planArticleNumber(t, list.name, entry.title[0], words);
             if (!number) return refused(Refused::NumbersUsedUp, std::move(words));
             result.articleNumber = std::move(*number);
-            t.write(articleName, removeArticleLine(articles, oldTitle,
-                                                   articleLine(entry.title, result.articleNumber)));
+            t.write(articleName,
+                    removeArticleLineAt(std::move(*articles), line,
+                                        articleLine(entry.title, result.articleNumber)));
         } else {
-            t.write(articleName, *renameArticleLine(articles, oldTitle, entry.title));
+            t.write(articleName,
+                    renameArticleLineAt(std::move(*articles), line, oldTitle.size(), entry.title));
         }
     }
     t.write(entryFile(list.name), std::move(*newText));
@@ -152,7 +155,8 @@ EditResult deleteEntry(Store& store, const OpenList& list, const std::string& ti
     t.write(entryFile(list.name), std::move(*newText));
     const std::string articleName = articleFile(list.name);
     if (auto articles = t.readTextIfExists(articleName)) {
-        t.write(articleName, removeArticleLine(*articles, title));
+        const std::size_t line = findArticleLine(*articles, title);
+        t.write(articleName, removeArticleLineAt(std::move(*articles), line));
     }
     t.commit();
     result.stamp = t.written(entryFile(list.name));

@@ -181,16 +181,20 @@ std::optional<std::string> removeEntry(std::string_view entries, std::string_vie
 }
 
 std::size_t findArticleLine(std::string_view articles, std::string_view title) {
-    std::size_t start = 0;
-    while (start < articles.size()) {
-        const std::size_t end = lineEnd(articles, start);
-        std::string_view line = articles.substr(start, end - start);
-        if (line.size() > title.size() + kArticleSeparator.size() &&
-            line.substr(title.size(), kArticleSeparator.size()) == kArticleSeparator &&
-            equalsIgnoreCase(line.substr(0, title.size()), title)) {
-            return start;
+    // A line ends at its CR, so a title holding one starts no line.
+    if (title.find('\r') != npos) return npos;
+    std::string needle;
+    needle.reserve(title.size() + kArticleSeparator.size());
+    needle.append(title).append(kArticleSeparator);
+    // The title and separator are searched for as one text, which skips most of the file; a
+    // match counts where a line starts and something follows it on that line (its CR at least).
+    for (std::size_t at = findIgnoreCase(articles, needle); at != npos;
+         at = findIgnoreCase(articles, needle, at + 1)) {
+        if (at + needle.size() >= articles.size()) return npos;
+        if (at == 0 || (articles[at - 1] == '\r' && articles[at] != '\n') ||
+            (articles[at - 1] == '\n' && at >= 2 && articles[at - 2] == '\r')) {
+            return at;
         }
-        start = end;
     }
     return npos;
 }
@@ -215,24 +219,27 @@ std::optional<std::string> renameArticleLine(std::string_view articles, std::str
                                              std::string_view newTitle) {
     const std::size_t at = findArticleLine(articles, oldTitle);
     if (at == npos) return std::nullopt;
-    std::string text;
-    text.reserve(articles.size() + newTitle.size());
-    text.append(articles.substr(0, at));
-    text.append(newTitle);
-    text.append(articles.substr(at + oldTitle.size()));
-    return text;
+    return renameArticleLineAt(std::string(articles), at, oldTitle.size(), newTitle);
+}
+
+std::string renameArticleLineAt(std::string&& articles, std::size_t at, std::size_t oldSize,
+                                std::string_view newTitle) {
+    articles.replace(at, oldSize, newTitle);
+    return std::move(articles);
 }
 
 std::string removeArticleLine(std::string_view articles, std::string_view title,
                               std::string_view appended) {
-    const std::size_t at = findArticleLine(articles, title);
-    const std::size_t end = at == npos ? at : lineEnd(articles, at);
     std::string text;
-    text.reserve(articles.size() - (end - at) + appended.size());  // npos - npos: nothing out
-    text.append(articles.substr(0, at));
-    if (at != npos) text.append(articles.substr(end));
-    text.append(appended);
-    return text;
+    text.reserve(articles.size() + appended.size());
+    text.append(articles);
+    return removeArticleLineAt(std::move(text), findArticleLine(articles, title), appended);
+}
+
+std::string removeArticleLineAt(std::string&& articles, std::size_t at, std::string_view appended) {
+    if (at != npos) articles.erase(at, lineEnd(articles, at) - at);
+    articles.append(appended);
+    return std::move(articles);
 }
 
 std::string removeIndexLine(std::string_view index, std::string_view name) {

@@ -98,6 +98,14 @@ std::optional<std::string> renameArticleLine(std::string_view articles, std::str
 std::string removeArticleLine(std::string_view articles, std::string_view title,
                               std::string_view appended = {});
 
+// The same two edits made in the text itself, on the line findArticleLine() found at `at`: the
+// title there, `oldSize` bytes, replaced; the line removed (none for npos) and `appended` added.
+// The text keeps its buffer: only what follows the line moves.
+std::string renameArticleLineAt(std::string&& articles, std::size_t at, std::size_t oldSize,
+                                std::string_view newTitle);
+std::string removeArticleLineAt(std::string&& articles, std::size_t at,
+                                std::string_view appended = {});
+
 // The list index without the first line equal to `name` ignoring case; unchanged when none.
 std::string removeIndexLine(std::string_view index, std::string_view name);
 
