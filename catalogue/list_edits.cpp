@@ -1,5 +1,6 @@
 #include "catalogue/list_edits.h"
 
+#include "catalogue/byte_scan.h"
 #include "catalogue/catalogue_error.h"
 #include "catalogue/entry_rules.h"
 #include "catalogue/file_text.h"
@@ -59,6 +60,7 @@ void planEmptyList(Transaction& t, const std::string& list) {
 }
 
 EditResult addEntry(Store& store, const OpenList& list, const Entry& entry) {
+    clearUpperVectorHalves();  // the scans of the list's texts below
     if (std::string words = entryRefusal(entry); !words.empty()) {
         return refused(Refused::BadEntry, std::move(words));
     }
@@ -90,6 +92,7 @@ EditResult addEntry(Store& store, const OpenList& list, const Entry& entry) {
 
 EditResult changeEntry(Store& store, const OpenList& list, const std::string& oldTitle,
                        const Entry& entry) {
+    clearUpperVectorHalves();  // the scans of the list's texts below
     if (std::string words = entryRefusal(entry); !words.empty()) {
         return refused(Refused::BadEntry, std::move(words));
     }
@@ -137,6 +140,7 @@ EditResult changeEntry(Store& store, const OpenList& list, const std::string& ol
 }
 
 EditResult deleteEntry(Store& store, const OpenList& list, const std::string& title) {
+    clearUpperVectorHalves();  // the scans of the list's texts below
     EditResult result;
     Transaction t = store.begin();
     if (list.whole) t.expect(entryFile(list.name), list.stamp);
