@@ -249,6 +249,7 @@ struct Growing {
 }  // namespace
 
 ImportResult importCsv(Store& store, const std::string& list, std::string_view csvBytes) {
+    clearUpperVectorHalves();
     ImportResult result;
     if (csvBytes.starts_with(kBom)) csvBytes.remove_prefix(kBom.size());
     CsvReader reader(csvBytes);
