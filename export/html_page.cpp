@@ -7,7 +7,8 @@ namespace exporting {
 
 namespace {
 
-// Appends `text` to `out` escaped: the runs between the bytes to escape are copied whole.
+// Appends `text` to `out` with "&", "<" and ">" written as character references, so that a
+// browser shows it as it is: the runs between the bytes to escape are copied whole.
 void appendEscaped(std::string& out, std::string_view text) {
     for (std::size_t at = 0; at < text.size();) {
         const std::size_t special = catalogue::findAnyOf<'&', '<', '>'>(text, at);
@@ -19,13 +20,6 @@ void appendEscaped(std::string& out, std::string_view text) {
 }
 
 }  // namespace
-
-std::string htmlEscape(std::string_view text) {
-    std::string out;
-    out.reserve(text.size() + text.size() / 8);
-    appendEscaped(out, text);
-    return out;
-}
 
 std::string HtmlPage(std::string_view listName, std::string_view reportText) {
     constexpr std::string_view crlf = catalogue::kCrLf;
