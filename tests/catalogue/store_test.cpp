@@ -219,6 +219,13 @@ TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
     }
     Store(folder.path()).recover();
     EXPECT_EQ(folder.get("b.dat"), "b new\r\n");
+
+    // A torn journal that cannot be removed is reported, not passed over.
+    putHalfDone(folder, kHalfDone.substr(0, kHalfDone.size() - 3));
+    FaultySys sys;
+    sys.failAt(SysCall::Unlink, 1, EIO);
+    EXPECT_THROW(Store(folder.path(), sys).recover(), CatalogueError);
+    EXPECT_TRUE(folder.has(kJournalName));
 }
 
 // The lock lives as long as the process holding it, however that process ends.

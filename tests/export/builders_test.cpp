@@ -91,8 +91,8 @@ TEST(Settings, QuotesWhatTheReaderWouldCutAndReadsItBack) {
 }
 
 TEST(Settings, ReadingRuleAndCheckValues) {
-    SettingsReader reader("  plain value \r\na,b\r\n\"x, \"\"y\"\"\" rest,next\n\r\n\"open");
-    for (const char* value : {"plain value ", "a", "b", "x, \"y\"", "next", ""}) {
+    SettingsReader reader("  plain value \r\na,b\r\n\"x, \"\"y\"\"\" rest,next\n\n\r\n\"open");
+    for (const char* value : {"plain value ", "a", "b", "x, \"y\"", "next", "", ""}) {
         EXPECT_EQ(reader.next(), value);
     }
     EXPECT_EQ(reader.next(), std::nullopt);  // an unclosed quote

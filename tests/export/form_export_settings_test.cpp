@@ -1,6 +1,8 @@
 // The export dialog's opening and closing on in-memory controls: loading, falling back to the
 // defaults, drives, and saving on every closing.
 #include <gtest/gtest.h>
+#include <pwd.h>
+#include <unistd.h>
 
 #include <filesystem>
 #include <functional>
@@ -30,9 +32,10 @@ std::string shown(ExportFixture& f) {
 }
 
 TEST(ExportSettingsLoad, NoSettingsWritesTheDefaultsForHomeOrElseTheWorkingFolder) {
-    for (bool homeUsable : {true, false}) {
+    // HOME as the fixture sets it, naming no folder, or unset (the account's home counts then).
+    for (const std::string home : {"", "/no/such/home", "unset"}) {
         ExportFixture f;
-        if (!homeUsable) ::setenv("HOME", "/no/such/home", 1);
+        home == "unset" ? ::unsetenv("HOME") : home.empty() ? 0 : ::setenv("HOME", home.c_str(), 1);
         f.openMovies();
         f.openDialog();
         EXPECT_EQ(f.dialog.window.caption() + "|" + f.dialog.Label1.caption() + "|" +
@@ -40,10 +43,12 @@ TEST(ExportSettingsLoad, NoSettingsWritesTheDefaultsForHomeOrElseTheWorkingFolde
                   "Export list|Output path:|Amount of last added|Add the last added list in");
         EXPECT_EQ(f.dialog.Text2.maxLength(), 2);
         EXPECT_FALSE(f.main.view.window.isEnabled());
-        const std::string folder =
-            homeUsable
-                ? f.home.path()
-                : std::filesystem::absolute(f.main.folder.path()).lexically_normal().string();
+        const passwd* account = ::getpwuid(::getuid());
+        std::string folder =
+            std::filesystem::absolute(f.main.folder.path()).lexically_normal().string();
+        if (home.empty()) folder = f.home.path();
+        if (home == "unset" && account != nullptr && std::filesystem::is_directory(account->pw_dir))
+            folder = account->pw_dir;
         EXPECT_EQ(f.main.folder.get("export.dat") + shown(f),
                   defaultsFor(folder) + defaultsFor(folder));
     }

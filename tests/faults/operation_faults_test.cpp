@@ -5,6 +5,8 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <chrono>
+#include <filesystem>
 
 #include "catalogue/file_text.h"
 #include "catalogue/list_import.h"
@@ -218,28 +220,43 @@ TEST_P(OperationFaults, AKillAtAnyStepRecoversToTheOldOrTheNewFiles) {
 }
 
 // Another program rewrites the open list's entry file (or, for a list deletion, the index) after
-// the window read it: the operation writes nothing, says so, and shows the files as they are.
+// the window read it, longer or to the same size: the operation writes nothing, says so, and
+// shows the files as they are, keeping what the user typed into the information box.
 class OpenListOperations : public OperationFaults {};
 
 TEST_P(OpenListOperations, AFileChangedBehindTheWindowIsNeverReplaced) {
     const Operation& op = GetParam();
+    const bool types = std::string_view(op.name).starts_with("Add") ||
+                       std::string_view(op.name).starts_with("Change");
     std::vector<std::string> files = {std::string(op.list) + ".dat"};
     if (op.act == deleteList) files.push_back("pemla.dat");
     for (const std::string& file : files) {
-        SCOPED_TRACE(file);
-        Rig r;
-        setUp(r, op);
-        const std::string behind = file == "pemla.dat" ? crlf({"Rock", "Jazz", "Solo", "Blues"})
-                                                       : entryText({{"Behind", "CD", "1", "x"}});
-        r.folder.put(file, r.files().at(file) + behind);
-        const Files before = r.files();
-        runAction(r, op, true);
-        EXPECT_EQ(r.files(), before) << difference(before, r.files());
-        ASSERT_EQ(r.errors().size(), 1u);
-        EXPECT_EQ(namedFile(r.errors().front().prompt), file);
-        const auto& shown = file == "pemla.dat" ? r.view.List_list : r.view.List1;
-        EXPECT_EQ(shown.items().size(),
-                  catalogue::splitLines(before.at(file)).size() / (file == "pemla.dat" ? 1 : 4));
+        for (const bool sameSize : {false, true}) {
+            SCOPED_TRACE(file + (sameSize ? ", same size" : ", longer"));
+            Rig r;
+            setUp(r, op);
+            std::string bytes = r.files().at(file);
+            if (sameSize) {
+                bytes[bytes.size() - 3] ^= 1;  // a letter of the last line
+            } else {
+                bytes +=
+                    file == "pemla.dat" ? crlf({"Blues"}) : entryText({{"Behind", "CD", "1", "x"}});
+            }
+            r.folder.put(file, bytes);
+            const auto path = std::filesystem::path(r.folder.file(file));
+            std::filesystem::last_write_time(
+                path, std::filesystem::last_write_time(path) + std::chrono::seconds(2));
+            const Files before = r.files();
+            const std::string information = r.view.Combo3.text();
+            runAction(r, op, true);
+            EXPECT_EQ(r.files(), before) << difference(before, r.files());
+            ASSERT_EQ(r.errors().size(), 1u);
+            EXPECT_EQ(namedFile(r.errors().front().prompt), file);
+            const auto& shown = file == "pemla.dat" ? r.view.List_list : r.view.List1;
+            EXPECT_EQ(shown.items().size(),
+                      catalogue::splitLines(bytes).size() / (file == "pemla.dat" ? 1 : 4));
+            EXPECT_EQ(r.view.Combo3.text(), types ? "Copy" : information);
+        }
     }
 }
 
