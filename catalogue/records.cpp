@@ -71,7 +71,7 @@ std::string flagFile(std::string_view list) {
 }
 
 std::optional<list_order::Items> entryTitles(std::string_view bytes) {
-    clearUpperVectorHalves();
+    clearUpperVectorHalves();  // the scans of the entry file below
     // The titles go into one buffer, not one string each: a long list opens that much faster.
     std::string titles;
     // Room enough not to move them while they grow: a title is at most the larger half of its

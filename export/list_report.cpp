@@ -1,5 +1,6 @@
 #include "export/list_report.h"
 
+#include "catalogue/byte_scan.h"
 #include "catalogue/catalogue_error.h"
 #include "catalogue/csv.h"
 #include "catalogue/file_names.h"
@@ -23,6 +24,7 @@ list_order::Items listTitles(catalogue::Store& store, const std::string& list) {
 
 ListReport buildListReport(catalogue::Store& store, const std::string& list, TitleList titles,
                            const ReportChoices& choices, std::string_view date) {
+    catalogue::clearUpperVectorHalves();  // the scans of the list's texts below
     ListReport result;
     // Lists made by older copies may have no flag file; the main window shows them with the
     // information column, and so does the report.
@@ -79,6 +81,7 @@ std::string reportFileBytes(const std::string& list, std::string report, bool ht
 }
 
 std::string listCsv(catalogue::Store& store, const std::string& list) {
+    catalogue::clearUpperVectorHalves();  // the scans of the list's texts below
     const list_order::Items titles = listTitles(store, list);
     const std::string entryText = store.readText(catalogue::entryFile(list));
     const std::string articleText = store.readText(catalogue::articleFile(list));
