@@ -150,10 +150,14 @@ TYPED_TEST(ControlContract, ListBoxKeepsOneOrderAndOneSelectionAndClicksForTheUs
     for (const auto& [out, in] : moves) {
         SCOPED_TRACE(out + " -> " + in);
         Strings titles = items();
-        if (!out.empty()) EXPECT_TRUE(list.removeItem(out));
-        if (!in.empty()) list.addItem(in);
-        std::erase(titles, out);
-        if (!in.empty()) titles.push_back(in);
+        if (!out.empty()) {
+            EXPECT_TRUE(list.removeItem(out));
+            std::erase(titles, out);
+        }
+        if (!in.empty()) {
+            list.addItem(in);
+            titles.push_back(in);
+        }
         EXPECT_EQ(items(), list_order::Items(titles).strings());
     }
     EXPECT_FALSE(list.removeItem("not there"));
