@@ -216,25 +216,10 @@ std::string articleLine(std::string_view title, std::string_view number) {
     return line;
 }
 
-std::optional<std::string> renameArticleLine(std::string_view articles, std::string_view oldTitle,
-                                             std::string_view newTitle) {
-    const std::size_t at = findArticleLine(articles, oldTitle);
-    if (at == npos) return std::nullopt;
-    return renameArticleLineAt(std::string(articles), at, oldTitle.size(), newTitle);
-}
-
 std::string renameArticleLineAt(std::string&& articles, std::size_t at, std::size_t oldSize,
                                 std::string_view newTitle) {
     articles.replace(at, oldSize, newTitle);
     return std::move(articles);
-}
-
-std::string removeArticleLine(std::string_view articles, std::string_view title,
-                              std::string_view appended) {
-    std::string text;
-    text.reserve(articles.size() + appended.size());
-    text.append(articles);
-    return removeArticleLineAt(std::move(text), findArticleLine(articles, title), appended);
 }
 
 std::string removeArticleLineAt(std::string&& articles, std::size_t at, std::string_view appended) {

@@ -88,19 +88,10 @@ std::optional<std::string> findArticleNumber(std::string_view articles, std::str
 // The article line for a title, with CR LF.
 std::string articleLine(std::string_view title, std::string_view number);
 
-// The article text with the title's line given a new title, keeping its number and place.
-// Nothing when the old title has no line.
-std::optional<std::string> renameArticleLine(std::string_view articles, std::string_view oldTitle,
-                                             std::string_view newTitle);
-
-// The article text without the title's first line (unchanged when the title has no line), and
-// then `appended`.
-std::string removeArticleLine(std::string_view articles, std::string_view title,
-                              std::string_view appended = {});
-
-// The same two edits made in the text itself, on the line findArticleLine() found at `at`: the
-// title there, `oldSize` bytes, replaced; the line removed (none for npos) and `appended` added.
-// The text keeps its buffer: only what follows the line moves.
+// Edits of the article text on the line findArticleLine() found at `at`, made in the text itself
+// (only what follows the line moves): the title there, `oldSize` bytes, given a new title that
+// keeps its number and place; or the line removed (nothing removed for npos) and `appended`
+// added at the end.
 std::string renameArticleLineAt(std::string&& articles, std::size_t at, std::size_t oldSize,
                                 std::string_view newTitle);
 std::string removeArticleLineAt(std::string&& articles, std::size_t at,

@@ -105,12 +105,14 @@ TEST(Records, ArticleLines) {
     EXPECT_EQ(findArticleNumber("x\nWars#*\\W001\r\n", "x\nWars"), "W001");
     EXPECT_EQ(articleLine("Star", "S001"), "Star#*\\S001\r\n");
 
-    EXPECT_EQ(renameArticleLine(articles, "STAR", "Moon"),
-              "Best of Star#*\\B001\r\n\r\nMoon#*\\S001\r\nStar Wars#*\\S002\r\nWars#*\\W001\r\n");
+    EXPECT_EQ(
+        renameArticleLineAt(std::string(articles), findArticleLine(articles, "STAR"), 4, "Moon"),
+        "Best of Star#*\\B001\r\n\r\nMoon#*\\S001\r\nStar Wars#*\\S002\r\nWars#*\\W001\r\n");
     // Removing keeps the empty line and the order of the rest.
-    EXPECT_EQ(removeArticleLine(articles, "Star"),
-              "Best of Star#*\\B001\r\n\r\nStar Wars#*\\S002\r\nWars#*\\W001\r\n");
-    EXPECT_EQ(removeArticleLine(articles, "ars"), articles);
+    EXPECT_EQ(removeArticleLineAt(std::string(articles), findArticleLine(articles, "Star"), "X"),
+              "Best of Star#*\\B001\r\n\r\nStar Wars#*\\S002\r\nWars#*\\W001\r\nX");
+    EXPECT_EQ(findArticleLine(articles, "ars"), std::string::npos);
+    EXPECT_EQ(removeArticleLineAt(std::string(articles), std::string::npos), articles);
 }
 
 TEST(Records, RemoveIndexLineTakesTheWholeLineIgnoringCase) {
