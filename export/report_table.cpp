@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cstring>
 #include <string>
 
 #include "catalogue/file_text.h"
@@ -145,6 +146,82 @@ void row(std::string& out, const ReportOptions& options, std::string_view title,
     out.append("|").append(kCrLf);
 }
 
+// Every row and separator line of the table is 78 characters and CR LF, unless a text too
+// long for its cell widens it.
+constexpr std::size_t kLineSize = 80;
+
+// Where the cells of a row stand, and the row with every cell empty: a row whose texts fit
+// their cells is that row with the texts copied over its spaces.
+struct RowShape {
+    std::string blank;
+    std::size_t article = 1, title, titleCut, titleWidth, type, discs, discsWidth, info;
+};
+
+RowShape shapeFor(const ReportOptions& options) {
+    RowShape shape;
+    row(shape.blank, options, {}, {}, {});
+    const bool art = options.articleNumbers;
+    shape.title = art ? 6 : 2;
+    shape.titleCut = options.information ? 26 : kWhole;
+    shape.titleWidth = options.information ? 27 : art ? 45 : 46;
+    shape.type = shape.title + shape.titleWidth + (art ? 1 : 2);
+    shape.discs = shape.type + 18 + (art ? 3 : 4);
+    shape.discsWidth = art ? 4 : 5;
+    shape.info = shape.discs + shape.discsWidth + (art ? 1 : 2);
+    return shape;
+}
+
+// The table's lines written into room made in `out` a block at a time, rather than appended
+// piece by piece: each line is then a few copies without a check of the string's size.
+class Lines {
+  public:
+    explicit Lines(std::string& out) : out_(out), used_(out.size()) {}
+
+    // `size` bytes to write at, right after the previous ones.
+    [[gnu::always_inline]] char* room(std::size_t size) {
+        if (out_.size() - used_ < size) out_.resize(std::max(used_ + size, out_.size() + kBlock));
+        char* const at = out_.data() + used_;
+        used_ += size;
+        return at;
+    }
+    void add(std::string_view line) { std::memcpy(room(line.size()), line.data(), line.size()); }
+    // Ends the writing: `out` holds what was written and nothing more.
+    void finish() { out_.resize(used_); }
+
+  private:
+    static constexpr std::size_t kBlock = 1 << 16;
+    std::string& out_;
+    std::size_t used_;
+};
+
+void put(char* to, std::string_view text, std::size_t size) {
+    if (size != 0) std::memcpy(to, text.data(), size);
+}
+
+// The row as row() writes it, into the blank row where its texts fit (nearly every row).
+void fittedRow(Lines& lines, std::string& scratch, const RowShape& shape,
+               const ReportOptions& options, std::string_view title, const Fields& fields,
+               std::string_view articleNumber) {
+    const std::size_t titleSize = std::min(title.size(), shape.titleCut);
+    const std::size_t discsSize = fields.discs.size() > 6 ? 5 : fields.discs.size();
+    if (titleSize > shape.titleWidth || discsSize > shape.discsWidth || articleNumber.size() > 4) {
+        scratch.clear();
+        row(scratch, options, title, fields, articleNumber);
+        lines.add(scratch);
+        return;
+    }
+    char* const cells = lines.room(kLineSize);
+    std::memcpy(cells, shape.blank.data(), kLineSize);
+    put(cells + shape.article, articleNumber, articleNumber.size());
+    put(cells + shape.title, title, titleSize);
+    put(cells + shape.type, fields.type, std::min<std::size_t>(fields.type.size(), 17));
+    put(cells + shape.discs, fields.discs, discsSize);
+    if (options.information) {
+        put(cells + shape.info, fields.information,
+            std::min<std::size_t>(fields.information.size(), 16));
+    }
+}
+
 void bottomLine(std::string& out, const Layout& layout, const ReportOptions& options,
                 std::size_t count) {
     if (!options.counter) {
@@ -192,26 +269,34 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
     topBorder(out, layout, listName, options, dateText);
     out.append(layout.header).append(kCrLf);
     out.append(layout.underline).append(kCrLf);
+    const RowShape shape = shapeFor(options);
+    const std::string underline = std::string(layout.underline).append(kCrLf);
+    static_assert(kArticleLayout.underline.size() + kCrLf.size() == kLineSize);
+    Lines lines(out);
+    std::string scratch;
     // Each title is looked up a few rows before its row is written, so that the memory its
     // lookups need is fetched meanwhile.
     constexpr std::size_t kAhead = 8;
-    std::array<std::size_t, kAhead> entryHash{}, articleHash{};
+    std::array<std::size_t, kAhead> hashes{};
     auto fetch = [&](std::size_t i) {
         if (i >= titles.size()) return;
-        entryHash[i % kAhead] = entries.prefetch(titles[i]);
-        if (options.articleNumbers) articleHash[i % kAhead] = articles.prefetch(titles[i]);
+        const std::size_t hash = titleHash(titles[i]);
+        hashes[i % kAhead] = hash;
+        entries.prefetch(hash);
+        if (options.articleNumbers) articles.prefetch(hash);
     };
     for (std::size_t i = 0; i < kAhead; ++i) fetch(i);
     for (std::size_t i = 0; i < titles.size(); ++i) {
         const std::string_view title = titles[i];
-        const std::size_t entry = entryHash[i % kAhead], article = articleHash[i % kAhead];
+        const std::size_t hash = hashes[i % kAhead];
         fetch(i + kAhead);
-        row(out, options, title, entries.find(title, entry),
-            options.articleNumbers ? articles.find(title, article) : std::string_view());
+        fittedRow(lines, scratch, shape, options, title, entries.find(title, hash),
+                  options.articleNumbers ? articles.find(title, hash) : std::string_view());
         if (options.separatorLines && i + 1 < titles.size()) {
-            out.append(layout.underline).append(kCrLf);
+            std::memcpy(lines.room(kLineSize), underline.data(), kLineSize);
         }
     }
+    lines.finish();
     bottomLine(out, layout, options, titles.size());
 }
 
