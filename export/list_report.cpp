@@ -85,8 +85,8 @@ std::string listCsv(catalogue::Store& store, const std::string& list) {
     const list_order::Items titles = listTitles(store, list);
     const std::string entryText = store.readText(catalogue::entryFile(list));
     const std::string articleText = store.readText(catalogue::articleFile(list));
-    const EntryIndex entries(entryText);
-    const ArticleIndex articles(articleText);
+    const EntryIndex entries(entryText, titles.size());
+    const ArticleIndex articles(articleText, titles.size());
     std::string csv =
         catalogue::csvRow({"title", "type", "discs", "information", "article number"});
     csv.reserve(entryText.size() + articleText.size());

@@ -263,8 +263,9 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
                        std::string_view articleText, TitleList titles, const ReportOptions& options,
                        std::string_view dateText) {
     const Layout& layout = layoutFor(options);
-    const EntryIndex entries(entryText);
-    const ArticleIndex articles(options.articleNumbers ? articleText : std::string_view());
+    const EntryIndex entries(entryText, titles.size());
+    const ArticleIndex articles(options.articleNumbers ? articleText : std::string_view(),
+                                titles.size());
 
     topBorder(out, layout, listName, options, dateText);
     out.append(layout.header).append(kCrLf);

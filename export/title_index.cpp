@@ -35,11 +35,24 @@ constexpr auto npos = std::string_view::npos;
     }
 }
 
+// The line at `at` when it is a plain one marked `Tag`: its value, and `at` moves past it.
+template <const std::string_view& Tag>
+[[gnu::always_inline]] inline bool plainLine(std::string_view text, std::size_t& at,
+                                             std::string_view& value) {
+    if (!hasAt(text, at, Tag)) return false;
+    const std::size_t end = plainLineEnd(text, at + 3);
+    if (end == npos) return false;
+    value = std::string_view(text.data() + at + 3, end - at - 3);
+    at = end + 2;
+    return true;
+}
+
 }  // namespace
 
-EntryIndex::EntryIndex(std::string_view text) : text_(text) {
+EntryIndex::EntryIndex(std::string_view text, std::size_t expected)
+    : text_(text), titles_(expected) {
     if (!indexPlainEntries()) {
-        titles_ = FlatTitleMap<Fields, sameTitle>(text_.size() / 60 + 1);
+        titles_ = FlatTitleMap<Fields, sameTitle>(expected);
         indexMarkedTitles();
     }
 }
@@ -50,17 +63,16 @@ EntryIndex::EntryIndex(std::string_view text) : text_(text) {
 // before, which is what the search for the markers finds. False for any other text.
 bool EntryIndex::indexPlainEntries() {
     using catalogue::kDiscsTag, catalogue::kInfoTag, catalogue::kTitleTag, catalogue::kTypeTag;
-    constexpr std::string_view kTags[4] = {kTitleTag, kTypeTag, kDiscsTag, kInfoTag};
-    std::string_view lines[4];
-    for (std::size_t at = 0; at < text_.size();) {
-        for (std::size_t k = 0; k < 4; ++k) {
-            if (!hasAt(text_, at, kTags[k])) return false;
-            const std::size_t end = plainLineEnd(text_, at + 3);
-            if (end == npos) return false;
-            lines[k] = text_.substr(at + 3, end - at - 3);
-            at = end + 2;
+    const std::string_view text = text_;
+    for (std::size_t at = 0; at < text.size();) {
+        std::string_view title;
+        Fields fields;
+        if (!plainLine<kTitleTag>(text, at, title) || !plainLine<kTypeTag>(text, at, fields.type) ||
+            !plainLine<kDiscsTag>(text, at, fields.discs) ||
+            !plainLine<kInfoTag>(text, at, fields.information)) {
+            return false;
         }
-        titles_.putFirst(lines[0], {lines[1], lines[2], lines[3]});
+        titles_.putFirst(title, fields);
     }
     return true;
 }
@@ -117,27 +129,30 @@ const std::vector<std::size_t>& EntryIndex::markers(std::size_t kind, std::strin
 // Lines are found as the catalogue's line rule finds them: a line ends at a CR, an LF right
 // after it is skipped, and the last one may end with the text. The stops of one walk are the
 // separators' first bytes and the CRs.
-ArticleIndex::ArticleIndex(std::string_view text) : numbers_(text.size() / 30 + 1) {
+ArticleIndex::ArticleIndex(std::string_view text, std::size_t expected) : numbers_(expected) {
     const std::string_view separator = catalogue::kArticleSeparator;
     std::size_t line = 0;
-    for (std::size_t at = catalogue::findAnyOf<'#', '\r'>(text); at < text.size();
-         at = catalogue::findAnyOf<'#', '\r'>(text, at)) {
+    for (std::size_t at = catalogue::findAnyOf<'#', '\r'>(text); at < text.size();) {
         if (text[at] == '\r') {
             at += at + 1 < text.size() && text[at + 1] == '\n' ? 2 : 1;
             line = at;
+        } else if (hasAt(text, at, separator)) {
+            const std::size_t numberAt = at + separator.size();
+            if (numberAt == text.size()) break;  // nothing at all follows the separator
+            // The number is the line's next four characters, or as many as it still has.
+            const std::size_t next = catalogue::findAnyOf<'#', '\r'>(text, numberAt);
+            std::size_t size = std::min<std::size_t>(next - numberAt, 4);
+            if (size < 4 && next < text.size() && text[next] == '#') {
+                while (size < 4 && numberAt + size < text.size() && text[numberAt + size] != '\r')
+                    ++size;
+            }
+            numbers_.putFirst(text.substr(line, at - line), text.substr(numberAt, size));
+            at = next;
             continue;
-        }
-        if (!hasAt(text, at, separator)) {
+        } else {
             ++at;
-            continue;
         }
-        const std::size_t numberAt = at + separator.size();
-        if (numberAt == text.size()) break;  // nothing at all follows the separator
-        // The number is the line's next four characters, or as many as it still has.
-        std::size_t size = 0;
-        while (size < 4 && numberAt + size < text.size() && text[numberAt + size] != '\r') ++size;
-        numbers_.putFirst(text.substr(line, at - line), text.substr(numberAt, size));
-        at = numberAt;
+        at = catalogue::findAnyOf<'#', '\r'>(text, at);
     }
 }
 

@@ -148,7 +148,8 @@ struct Fields {
 // their markers after the title, which in a file the program wrote start the next lines.
 class EntryIndex {
   public:
-    explicit EntryIndex(std::string_view text);
+    // `expected`: about how many titles the text holds (the table grows past it).
+    EntryIndex(std::string_view text, std::size_t expected);
 
     // Fetches what find() needs of a title hashed `hash` (its titleHash()) into the cache.
     void prefetch(std::size_t hash) const { titles_.prefetch(hash); }
@@ -166,8 +167,7 @@ class EntryIndex {
     const std::vector<std::size_t>& markers(std::size_t kind, std::string_view tag) const;
 
     std::string_view text_;
-    // Entries of a real list take some 60 bytes or more; the map grows should they be shorter.
-    FlatTitleMap<Fields, sameTitle> titles_{text_.size() / 60 + 1};
+    FlatTitleMap<Fields, sameTitle> titles_;
     mutable std::optional<std::vector<std::size_t>> markers_[3];  // type, discs, info
 };
 
@@ -176,7 +176,8 @@ class EntryIndex {
 // the catalogue would allow.
 class ArticleIndex {
   public:
-    explicit ArticleIndex(std::string_view text);
+    // `expected`: about how many lines the text holds (the table grows past it).
+    ArticleIndex(std::string_view text, std::size_t expected);
 
     // Fetches what find() needs of a title hashed `hash` (its titleHash()) into the cache.
     void prefetch(std::size_t hash) const { numbers_.prefetch(hash); }
@@ -188,7 +189,6 @@ class ArticleIndex {
     }
 
   private:
-    // Article lines of a real list take some 30 bytes; the map grows should they be shorter.
     FlatTitleMap<std::string_view, sameTitleIgnoringCase> numbers_;
 };
 
