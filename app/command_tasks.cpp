@@ -112,6 +112,7 @@ std::string exportBytes(const CommandLine& line, catalogue::Store& store, const 
     if (line.csv) return exporting::listCsv(store, list);
     exporting::ReportChoices choices = savedChoices(store);
     choices.articleNumbers = line.articleNumbers;
+    choices.html = line.html;
     const std::string date = choices.date ? ui::qt::QtPlatform().shortDate() : std::string();
     exporting::ListReport report =
         exporting::buildListReport(store, list, exporting::listTitles(store, list), choices, date);
@@ -119,7 +120,7 @@ std::string exportBytes(const CommandLine& line, catalogue::Store& store, const 
         err << "pemla: the export settings ask for more last added titles than the list holds; "
                "the report leaves that section out.\n";
     }
-    return exporting::reportFileBytes(list, std::move(report.text), line.html);
+    return std::move(report.text);
 }
 
 std::string readWholeFile(const std::string& path) {

@@ -158,6 +158,7 @@ std::string Form_Export::BuildReport(const std::string& list) {
     choices.lastAdded = c_.Check_lastadd.value() == 1;
     choices.amountText = c_.Text2.text();
     choices.position = c_.Combo1.text();
+    choices.html = c_.Checkhtml.value() == 1;
     const std::string date = choices.date ? platform_.shortDate() : std::string();
     ListReport report = buildListReport(store_, list, titles, choices, date);
     if (report.flag == 1) c_.Check_noinfo.setValue(0);
@@ -184,9 +185,7 @@ void Form_Export::RunExport() {
             c_.Text1.setText(folder);
             // The folder is the file system's bytes; the list name is converted to match them.
             const std::string out = folder + catalogue::fileSystemName(list);
-            const bool html = c_.Checkhtml.value() == 1;
-            store_.writeReport(out + (html ? ".html" : ".TXT"),
-                               reportFileBytes(list, std::move(report), html));
+            store_.writeReport(out + (c_.Checkhtml.value() == 1 ? ".html" : ".TXT"), report);
         } catch (const CatalogueError& error) {
             c_.window.setEnabled(true);
             main_.showError(error.file(), error.reason());

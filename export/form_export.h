@@ -71,7 +71,7 @@ class Form_Export : public main_window::MainWindowDialog {
     // Writes the controls' settings to "export.dat". Throws CatalogueError.
     void SaveSettings();
 
-    // The whole report text of a list as RunExport writes it, without the file's closing CR LF.
+    // The bytes of a list's report file as RunExport writes it: the text, or the HTML page.
     // Sets Check_noinfo from the list's flag; may clear Check_lastadd and show its refusal.
     // Throws CatalogueError when a list file is missing or unreadable.
     std::string BuildReport(const std::string& list);

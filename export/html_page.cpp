@@ -5,10 +5,9 @@
 
 namespace exporting {
 
-namespace {
+using catalogue::kCrLf;
 
-// Appends `text` to `out` with "&", "<" and ">" written as character references, so that a
-// browser shows it as it is: the runs between the bytes to escape are copied whole.
+// The runs between the bytes to escape are copied whole.
 void appendEscaped(std::string& out, std::string_view text) {
     for (std::size_t at = 0; at < text.size();) {
         const std::size_t special = catalogue::findAnyOf<'&', '<', '>'>(text, at);
@@ -19,28 +18,41 @@ void appendEscaped(std::string& out, std::string_view text) {
     }
 }
 
-}  // namespace
+void appendText(std::string& out, std::string_view text, bool html) {
+    if (html) {
+        appendEscaped(out, text);
+    } else {
+        out.append(text);
+    }
+}
+
+void appendPageStart(std::string& out, std::string_view listName) {
+    out.append("<html>").append(kCrLf);
+    out.append("<head>").append(kCrLf);
+    out.append("<title>");
+    appendEscaped(out, listName);
+    out.append("</title>").append(kCrLf);
+    out.append("<meta http-equiv=\"Content-Type\" content=\"text/html; charset=iso-8859-1\">")
+        .append(kCrLf);
+    out.append("</head>").append(kCrLf);
+    out.append("<body bgcolor=\"#000000\" text=\"#00AAFF\">").append(kCrLf);
+    out.append("<pre>").append(kCrLf);
+}
+
+void appendPageEnd(std::string& out) {
+    out.append(kCrLf);
+    out.append("</pre>").append(kCrLf);
+    out.append("</body>").append(kCrLf);
+    out.append("</html>").append(kCrLf);
+}
 
 std::string HtmlPage(std::string_view listName, std::string_view reportText) {
-    constexpr std::string_view crlf = catalogue::kCrLf;
     // An escape adds at most four bytes; a report's own drawing escapes two bytes of a line.
     std::string page;
     page.reserve(reportText.size() + reportText.size() / 8 + 5 * listName.size() + 256);
-    page.append("<html>").append(crlf);
-    page.append("<head>").append(crlf);
-    page.append("<title>");
-    appendEscaped(page, listName);
-    page.append("</title>").append(crlf);
-    page.append("<meta http-equiv=\"Content-Type\" content=\"text/html; charset=iso-8859-1\">")
-        .append(crlf);
-    page.append("</head>").append(crlf);
-    page.append("<body bgcolor=\"#000000\" text=\"#00AAFF\">").append(crlf);
-    page.append("<pre>").append(crlf);
+    appendPageStart(page, listName);
     appendEscaped(page, reportText);
-    page.append(crlf);
-    page.append("</pre>").append(crlf);
-    page.append("</body>").append(crlf);
-    page.append("</html>").append(crlf);
+    appendPageEnd(page);
     return page;
 }
 

@@ -42,6 +42,7 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list, Tit
     options.date = choices.date;
     options.separatorLines = choices.separatorLines;
     options.counter = choices.counter;
+    options.html = choices.html;
 
     LastAddedRequest request;
     request.include = choices.lastAdded;
@@ -61,23 +62,28 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list, Tit
     }
 
     // One buffer, in the report's order: the section placed on top (and an empty line), the top
-    // text, the table, the section placed below, the credit line; and room for the file's end.
+    // text, the table, the section placed below, the credit line and the file's end; a page
+    // around them all, escaped as they are written.
     std::string& out = result.text;
-    out.reserve((section ? section->size() : 0) + top.size() +
-                reportTableSize(titles.size(), options) + 128);
-    if (sectionFirst) out.append(*section).append(catalogue::kCrLf);
-    out.append(top);
+    const bool html = choices.html;
+    std::size_t size = (section ? section->size() : 0) + top.size() +
+                       reportTableSize(titles.size(), options) + 128;
+    // An escape adds at most four bytes; the table's own drawing escapes two bytes of a line.
+    if (html) size += size / 8 + 5 * list.size() + 256;
+    out.reserve(size);
+    if (html) appendPageStart(out, list);
+    std::string pieces;
+    if (sectionFirst) pieces.append(*section).append(catalogue::kCrLf);
+    pieces.append(top);
+    appendText(out, pieces, html);
     appendReportTable(out, list, entries, articles, titles, options,
                       choices.date ? date : std::string_view());
-    if (section && !sectionFirst) out.append(*section);
-    out.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
+    pieces.clear();
+    if (section && !sectionFirst) pieces.append(*section);
+    pieces.append(36, ' ').append(kCreditText).append(catalogue::kCrLf);
+    appendText(out, pieces, html);
+    html ? appendPageEnd(out) : void(out.append(catalogue::kCrLf));
     return result;
-}
-
-std::string reportFileBytes(const std::string& list, std::string report, bool html) {
-    if (html) return HtmlPage(list, report);
-    report.append(catalogue::kCrLf);
-    return report;
 }
 
 std::string listCsv(catalogue::Store& store, const std::string& list) {

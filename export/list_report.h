@@ -20,12 +20,13 @@ struct ReportChoices {
     bool separatorLines = false;  // Checkline
     bool noInformation = false;   // Check_noinfo, before the list's flag decides
     bool lastAdded = false;       // Check_lastadd
+    bool html = false;            // Checkhtml
     std::string amountText = "10";
     std::string position = "Top";
 };
 
 struct ListReport {
-    std::string text;               // the report, without the text file's closing CR LF
+    std::string text;               // the file's bytes: the report and a CR LF, or the HTML page
     std::optional<long> flag;       // the list's information flag as read
     bool information = false;       // whether the report has the information column
     bool lastAddedRefused = false;  // more last-added rows asked for than there are titles
@@ -42,9 +43,6 @@ list_order::Items listTitles(catalogue::Store& store, const std::string& list);
 // unreadable (the top text excepted).
 ListReport buildListReport(catalogue::Store& store, const std::string& list, TitleList titles,
                            const ReportChoices& choices, std::string_view date);
-
-// The bytes of the report file: the HTML page, or the text followed by one more CR LF.
-std::string reportFileBytes(const std::string& list, std::string report, bool html);
 
 // The list as CSV in UTF-8: the header "title,type,discs,information,article number", then one
 // row per title in the order the main window shows them, its fields and article number found as

@@ -8,6 +8,7 @@
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
+#include "export/html_page.h"
 #include "export/title_index.h"
 
 namespace exporting {
@@ -185,6 +186,8 @@ class Lines {
         return at;
     }
     void add(std::string_view line) { std::memcpy(room(line.size()), line.data(), line.size()); }
+    // Takes back the last `size` bytes written.
+    void drop(std::size_t size) { used_ -= size; }
     // Ends the writing: `out` holds what was written and nothing more.
     void finish() { out_.resize(used_); }
 
@@ -193,6 +196,12 @@ class Lines {
     std::string& out_;
     std::size_t used_;
 };
+
+std::string escaped(std::string_view text) {
+    std::string out;
+    appendEscaped(out, text);
+    return out;
+}
 
 void put(char* to, std::string_view text, std::size_t size) {
     if (size != 0) std::memcpy(to, text.data(), size);
@@ -207,7 +216,7 @@ void fittedRow(Lines& lines, std::string& scratch, const RowShape& shape,
     if (titleSize > shape.titleWidth || discsSize > shape.discsWidth || articleNumber.size() > 4) {
         scratch.clear();
         row(scratch, options, title, fields, articleNumber);
-        lines.add(scratch);
+        lines.add(options.html ? escaped(scratch) : scratch);
         return;
     }
     char* const cells = lines.room(kLineSize);
@@ -219,6 +228,12 @@ void fittedRow(Lines& lines, std::string& scratch, const RowShape& shape,
     if (options.information) {
         put(cells + shape.info, fields.information,
             std::min<std::size_t>(fields.information.size(), 16));
+    }
+    // The blank row escapes nothing: a row of a page that does is written again, escaped.
+    if (options.html && needsEscapes({cells, kLineSize})) {
+        scratch.assign(cells, kLineSize);
+        lines.drop(kLineSize);
+        lines.add(escaped(scratch));
     }
 }
 
@@ -267,12 +282,16 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
     const ArticleIndex articles(options.articleNumbers ? articleText : std::string_view(),
                                 titles.size());
 
-    topBorder(out, layout, listName, options, dateText);
-    out.append(layout.header).append(kCrLf);
-    out.append(layout.underline).append(kCrLf);
+    // The lines around the rows, escaped for a page as a whole; the rows are escaped one by one
+    // where they need it.
+    std::string head;
+    topBorder(head, layout, listName, options, dateText);
+    head.append(layout.header).append(kCrLf);
+    head.append(layout.underline).append(kCrLf);
+    appendText(out, head, options.html);
     const RowShape shape = shapeFor(options);
-    const std::string underline = std::string(layout.underline).append(kCrLf);
-    static_assert(kArticleLayout.underline.size() + kCrLf.size() == kLineSize);
+    std::string underline = std::string(layout.underline).append(kCrLf);
+    if (options.html) underline = escaped(underline);
     Lines lines(out);
     std::string scratch;
     // Each title is looked up a few rows before its row is written, so that the memory its
@@ -294,11 +313,17 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
         fittedRow(lines, scratch, shape, options, title, entries.find(title, hash),
                   options.articleNumbers ? articles.find(title, hash) : std::string_view());
         if (options.separatorLines && i + 1 < titles.size()) {
-            std::memcpy(lines.room(kLineSize), underline.data(), kLineSize);
+            if (underline.size() == kLineSize) {
+                std::memcpy(lines.room(kLineSize), underline.data(), kLineSize);
+            } else {
+                lines.add(underline);  // escaped for a page
+            }
         }
     }
     lines.finish();
-    bottomLine(out, layout, options, titles.size());
+    std::string bottom;
+    bottomLine(bottom, layout, options, titles.size());
+    appendText(out, bottom, options.html);
 }
 
 }  // namespace exporting

@@ -17,6 +17,7 @@ struct ReportOptions {
     bool date = false;            // Checkdate: the date in the top border
     bool separatorLines = false;  // Checkline: the header underline between rows
     bool counter = false;         // Checkcounter: the number of titles in the bottom line
+    bool html = false;            // Checkhtml: the table escaped for an HTML page
 };
 
 // The titles of a report in their order, held as strings or as views into what holds them. It

@@ -49,6 +49,10 @@ template <const std::string_view& Tag>
 
 }  // namespace
 
+bool needsEscapes(std::string_view text) {
+    return catalogue::findAnyOf<'&', '<', '>'>(text) != text.size();
+}
+
 EntryIndex::EntryIndex(std::string_view text, std::size_t expected)
     : text_(text), titles_(expected) {
     if (!indexPlainEntries()) {

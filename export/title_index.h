@@ -136,6 +136,9 @@ inline bool sameTitleIgnoringCase(std::string_view a, std::string_view b) {
     return sameTitle(a, b) || (a.size() == b.size() && catalogue::equalsIgnoreCase(a, b));
 }
 
+// Whether `text` holds "&", "<" or ">".
+bool needsEscapes(std::string_view text);
+
 // The three fields of an entry besides its title, as views into the entry text.
 struct Fields {
     std::string_view type;

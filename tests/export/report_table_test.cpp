@@ -10,6 +10,7 @@
 
 #include "bench/catalogue_maker.h"
 #include "catalogue/records.h"
+#include "export/html_page.h"
 #include "list_order/list_order.h"
 #include "tests/export/export_fixture.h"
 
@@ -99,6 +100,48 @@ TEST(ReportTable, FieldsOfAHandEditedEntryAreTheFirstMarkersThatFollow) {
     const std::string entries = "<|?Odd\r\nnote <b>\r\n<|'LP\r\n<|*i\r\n<||2\r\n";
     EXPECT_EQ(linesOf(BuildReportTable("M", entries, "", {"Odd"}, {false, true}, ""))[3],
               "| Odd                        | LP                |   2    |                  |\r\n");
+}
+
+// Titles of 7 to 17 bytes, around the eight-byte steps of the lookups: an entry is found only
+// under its exact title, an article number under the title in any case.
+TEST(ReportTable, TitlesAroundEightBytesFindTheirEntryExactlyAndTheirNumberInAnyCase) {
+    std::string entries, articles;
+    std::vector<std::string> titles;
+    for (const std::size_t size : {7u, 8u, 9u, 16u, 17u}) {
+        const std::string title = std::string(size - 1, 'x') + "A",
+                          other = title.substr(0, size - 1);
+        entries += "<|?" + title + "\r\n<|'T" + std::to_string(size) + "\r\n<||1\r\n<|*i\r\n";
+        articles += other + "a#*\\A" + std::to_string(100 + size) + "\r\n";
+        titles.insert(titles.end(), {title, other + "a"});
+    }
+    const auto lines = linesOf(BuildReportTable("M", entries, articles, titles, {true}, ""));
+    for (std::size_t i = 0; i < titles.size(); ++i) {
+        const std::string number = "A" + std::to_string(100 + titles[i].size());
+        const std::string type = i % 2 == 0 ? "T" + std::to_string(titles[i].size()) : "";
+        EXPECT_EQ(lines[3 + i], "|" + number + "|" + exporting::padded(titles[i], 45) + "|" +
+                                    exporting::padded(type, 18) + "|  " +
+                                    exporting::padded(type.empty() ? "" : "1", 4) + "|\r\n");
+    }
+}
+
+// A page's table is the text table escaped, for rows copied into their cells and rows written
+// whole alike, from plain entries and from a hand-edited text.
+TEST(ReportTable, PageTableIsTheTextTableEscaped) {
+    const std::vector<std::string> titles = {"Tom & Jerry", "<Heat>", "Gone", "Nowhere & <x>"};
+    const std::string articles = "<heat>#*\\H&01\r\nTom & jerry#*\\T001\r\n";
+    for (const std::string entries :
+         {"<|?Tom & Jerry\r\n<|'Cartoon\r\n<||1\r\n<|*A > B\r\n<|?<Heat>\r\n<|'Film\r\n"
+          "<||2\r\n<|*\r\n<|?Gone\r\n<|'Game\r\n<||1234567\r\n<|*Copy\r\n",
+          "<|?Tom & Jerry\r\n<|'Cartoon\r\n<|*A > B\r\n<||1\r\n<|?<Heat>\r\n<|'Film\r\n"
+          "<||2\r\n"}) {
+        Options text{true, true, true, true, true};
+        Options page = text;
+        page.html = true;
+        std::string escaped;
+        exporting::appendEscaped(escaped,
+                                 BuildReportTable("A&B", entries, articles, titles, text, "<1.1>"));
+        EXPECT_EQ(BuildReportTable("A&B", entries, articles, titles, page, "<1.1>"), escaped);
+    }
 }
 
 TEST(ReportTable, LargestListIsBuiltInLinearTime) {
