@@ -47,6 +47,13 @@ template <const std::string_view& Tag>
     return true;
 }
 
+// Where a line starts by the line rule: at the text's start, after a CR, or after the LF that
+// follows a CR.
+bool startsLine(std::string_view text, std::size_t at) {
+    return at == 0 || (text[at - 1] == '\r' && text[at] != '\n') ||
+           (text[at - 1] == '\n' && at >= 2 && text[at - 2] == '\r');
+}
+
 }  // namespace
 
 bool needsEscapes(std::string_view text) {
@@ -54,9 +61,10 @@ bool needsEscapes(std::string_view text) {
 }
 
 EntryIndex::EntryIndex(std::string_view text, std::size_t expected)
-    : text_(text), titles_(expected) {
-    if (!indexPlainEntries()) {
-        titles_ = FlatTitleMap<Fields, sameTitle>(expected);
+    : text_(text), titles_(text, expected) {
+    plain_ = indexPlainEntries();
+    if (!plain_) {
+        titles_ = PlaceMap<TitleKey>(text, expected);
         indexMarkedTitles();
     }
 }
@@ -69,32 +77,58 @@ bool EntryIndex::indexPlainEntries() {
     using catalogue::kDiscsTag, catalogue::kInfoTag, catalogue::kTitleTag, catalogue::kTypeTag;
     const std::string_view text = text_;
     for (std::size_t at = 0; at < text.size();) {
-        std::string_view title;
-        Fields fields;
-        if (!plainLine<kTitleTag>(text, at, title) || !plainLine<kTypeTag>(text, at, fields.type) ||
-            !plainLine<kDiscsTag>(text, at, fields.discs) ||
-            !plainLine<kInfoTag>(text, at, fields.information)) {
+        const std::size_t marker = at;
+        std::string_view title, field;
+        if (!plainLine<kTitleTag>(text, at, title) || !plainLine<kTypeTag>(text, at, field) ||
+            !plainLine<kDiscsTag>(text, at, field) || !plainLine<kInfoTag>(text, at, field)) {
             return false;
         }
-        titles_.putFirst(title, fields);
+        titles_.putFirst(title, marker);
     }
     return true;
 }
 
-// Any other text: every title marker starts a title up to its CR, and each field is searched.
+// Any other text: every title marker starts a title up to its CR; the fields are searched for
+// when the title is looked up.
 void EntryIndex::indexMarkedTitles() {
     for (std::size_t at = text_.find(catalogue::kTitleTag); at != npos;
          at = text_.find(catalogue::kTitleTag, at + 1)) {
         const std::size_t start = at + catalogue::kTitleTag.size();
         const std::size_t cr = text_.find('\r', start);
-        if (cr == npos) break;      // a title line needs its CR
-        std::size_t from = at + 1;  // past the title's own marker, which is none of the others
-        Fields fields;
-        fields.type = fieldAfter(catalogue::kTypeTag, 0, from);
-        fields.discs = fieldAfter(catalogue::kDiscsTag, 1, from);
-        fields.information = fieldAfter(catalogue::kInfoTag, 2, from);
-        titles_.putFirst(text_.substr(start, cr - start), fields);
+        if (cr == npos) break;  // a title line needs its CR
+        titles_.putFirst(text_.substr(start, cr - start), at);
     }
+}
+
+std::string_view EntryIndex::TitleKey::at(std::string_view text, std::size_t marker) {
+    const std::size_t start = marker + 3;
+    return text.substr(start, text.find('\r', start) - start);
+}
+
+Fields EntryIndex::find(std::string_view title, std::size_t hash) const {
+    // A title holding a CR is none of the titles, which end at their line's CR.
+    if (catalogue::findAnyOf<'\r'>(title) != title.size()) return {};
+    const std::size_t marker = titles_.find(title, hash);
+    if (marker == npos) return {};
+    if (plain_) return plainFields(marker + 3 + title.size() + 2);
+    std::size_t from = marker + 1;  // past the title's own marker, which is none of the others
+    Fields fields;
+    fields.type = fieldAfter(catalogue::kTypeTag, 0, from);
+    fields.discs = fieldAfter(catalogue::kDiscsTag, 1, from);
+    fields.information = fieldAfter(catalogue::kInfoTag, 2, from);
+    return fields;
+}
+
+// The three lines of a plain entry from its type line on, without their markers.
+Fields EntryIndex::plainFields(std::size_t typeLine) const {
+    std::string_view lines[3];
+    for (std::string_view& line : lines) {
+        const std::size_t start = typeLine + 3;
+        const std::size_t cr = catalogue::findAnyOf<'\r'>(text_, start);
+        line = std::string_view(text_.data() + start, cr - start);
+        typeLine = cr + 2;
+    }
+    return {lines[0], lines[1], lines[2]};
 }
 
 // The text after the first `tag` at or after `from`, up to the next CR; `from` moves to that
@@ -133,7 +167,8 @@ const std::vector<std::size_t>& EntryIndex::markers(std::size_t kind, std::strin
 // Lines are found as the catalogue's line rule finds them: a line ends at a CR, an LF right
 // after it is skipped, and the last one may end with the text. The stops of one walk are the
 // separators' first bytes and the CRs.
-ArticleIndex::ArticleIndex(std::string_view text, std::size_t expected) : numbers_(expected) {
+ArticleIndex::ArticleIndex(std::string_view text, std::size_t expected)
+    : text_(text), numbers_(text, expected) {
     const std::string_view separator = catalogue::kArticleSeparator;
     std::size_t line = 0;
     for (std::size_t at = catalogue::findAnyOf<'#', '\r'>(text); at < text.size();) {
@@ -141,23 +176,41 @@ ArticleIndex::ArticleIndex(std::string_view text, std::size_t expected) : number
             at += at + 1 < text.size() && text[at + 1] == '\n' ? 2 : 1;
             line = at;
         } else if (hasAt(text, at, separator)) {
-            const std::size_t numberAt = at + separator.size();
-            if (numberAt == text.size()) break;  // nothing at all follows the separator
-            // The number is the line's next four characters, or as many as it still has.
-            const std::size_t next = catalogue::findAnyOf<'#', '\r'>(text, numberAt);
-            std::size_t size = std::min<std::size_t>(next - numberAt, 4);
-            if (size < 4 && next < text.size() && text[next] == '#') {
-                while (size < 4 && numberAt + size < text.size() && text[numberAt + size] != '\r')
-                    ++size;
-            }
-            numbers_.putFirst(text.substr(line, at - line), text.substr(numberAt, size));
-            at = next;
-            continue;
+            // Nothing at all after the separator ends the text, and the walk.
+            if (at + separator.size() == text.size()) break;
+            numbers_.putFirst(text.substr(line, at - line), at);
+            at += separator.size();
         } else {
             ++at;
         }
         at = catalogue::findAnyOf<'#', '\r'>(text, at);
     }
+}
+
+std::string_view ArticleIndex::find(std::string_view title, std::size_t hash) const {
+    // A title holding a CR is none of the titles, which end before their line's CR.
+    if (catalogue::findAnyOf<'\r'>(title) != title.size()) return {};
+    const std::size_t separator = numbers_.find(title, hash);
+    if (separator == npos) return {};
+    // The number is the line's next four characters, or as many as it still has.
+    const std::size_t start = separator + catalogue::kArticleSeparator.size();
+    std::size_t size = 0;
+    while (size < 4 && start + size < text_.size() && text_[start + size] != '\r') ++size;
+    return text_.substr(start, size);
+}
+
+std::string_view ArticleIndex::LineKey::at(std::string_view text, std::size_t separator) {
+    std::size_t start = separator;
+    while (!startsLine(text, start)) --start;
+    return text.substr(start, separator - start);
+}
+
+// `title` (without a CR) stands before the separator from the start of its line, ignoring case.
+bool ArticleIndex::LineKey::holds(std::string_view text, std::size_t separator,
+                                  std::string_view title) {
+    if (separator < title.size() || !startsLine(text, separator - title.size())) return false;
+    const std::string_view there = text.substr(separator - title.size(), title.size());
+    return sameTitle(there, title) || catalogue::equalsIgnoreCase(there, title);
 }
 
 }  // namespace exporting

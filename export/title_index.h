@@ -6,8 +6,6 @@
 #include <string_view>
 #include <vector>
 
-#include "catalogue/latin1.h"
-
 // Lookups of many titles in one entry text or article text, each text indexed once, so that a
 // report of the largest list costs linear time. They find what the catalogue's one-title lookups
 // find on the same texts.
@@ -43,30 +41,30 @@ inline std::size_t titleHash(std::string_view text) {
     return static_cast<std::size_t>(h);
 }
 
-// Titles to values found through open addressing, hashed by titleHash(): built once per report,
-// it costs no allocation per title. A slot is eight bytes (part of the hash, and which record),
-// so the table of a full list stays in the processor's cache. The first value put in for a
-// title stays.
-template <typename Value, bool (*Equal)(std::string_view, std::string_view)>
-class FlatTitleMap {
+// Where the titles of one text stand, found by title through open addressing and kept in
+// nothing but the table: a slot is eight bytes, part of the title's hash and the title's place
+// in the text, and the title is compared where it stands. A full list's table then takes half a
+// megabyte, which the report fetches a few rows ahead. `Key` tells the title at a place and
+// whether a title is the one there. The first place put in for a title stays.
+template <typename Key>
+class PlaceMap {
   public:
-    explicit FlatTitleMap(std::size_t expected) {
+    static constexpr std::size_t npos = std::string_view::npos;
+
+    PlaceMap(std::string_view text, std::size_t expected) : text_(text) {
         std::size_t size = 64;
         while (size < expected * 2) size *= 2;
         slots_.resize(size);
-        records_.reserve(expected);
     }
 
-    void putFirst(std::string_view title, const Value& value) {
+    void putFirst(std::string_view title, std::size_t place) {
         const std::size_t hash = titleHash(title);
         std::size_t i = hash & (slots_.size() - 1);
         for (; slots_[i] != 0; i = (i + 1) & (slots_.size() - 1)) {
             if (matches(slots_[i], hash, title)) return;
         }
-        // Records are counted in 32 bits: a text holding 2^32 titles would not fit in memory.
-        records_.push_back({title, value});
-        slots_[i] = tagOf(hash) | records_.size();
-        if (records_.size() * 2 > slots_.size()) grow();
+        slots_[i] = tagOf(hash) | (place + 1);
+        if (++used_ * 2 > slots_.size()) grow();
     }
 
     // Fetches the slot of a title hashed `hash` into the cache, for a find() a little later.
@@ -74,28 +72,22 @@ class FlatTitleMap {
         __builtin_prefetch(&slots_[hash & (slots_.size() - 1)]);
     }
 
-    // The value of `title`, whose titleHash() is `hash`; nothing when it has none.
-    const Value* find(std::string_view title, std::size_t hash) const {
+    // The place of `title`, whose titleHash() is `hash`; npos when it has none.
+    std::size_t find(std::string_view title, std::size_t hash) const {
         for (std::size_t i = hash & (slots_.size() - 1); slots_[i] != 0;
              i = (i + 1) & (slots_.size() - 1)) {
-            if (matches(slots_[i], hash, title))
-                return &records_[(slots_[i] & 0xFFFFFFFFu) - 1].value;
+            if (matches(slots_[i], hash, title)) return (slots_[i] & kPlaces) - 1;
         }
-        return nullptr;
+        return npos;
     }
 
   private:
-    struct Record {
-        std::string_view title;
-        Value value;
-    };
+    // Places take the low 40 bits: a text of a terabyte would not fit in memory.
+    static constexpr std::uint64_t kPlaces = (std::uint64_t{1} << 40) - 1;
 
-    static std::uint64_t tagOf(std::size_t hash) {
-        return static_cast<std::uint64_t>(hash) >> 32 << 32;
-    }
+    static std::uint64_t tagOf(std::size_t hash) { return hash & ~kPlaces; }
     bool matches(std::uint64_t slot, std::size_t hash, std::string_view title) const {
-        return (slot >> 32 << 32) == tagOf(hash) &&
-               Equal(records_[(slot & 0xFFFFFFFFu) - 1].title, title);
+        return (slot & ~kPlaces) == tagOf(hash) && Key::holds(text_, (slot & kPlaces) - 1, title);
     }
 
     void grow() {
@@ -103,15 +95,16 @@ class FlatTitleMap {
         old.swap(slots_);
         for (const std::uint64_t slot : old) {
             if (slot == 0) continue;
-            const std::size_t hash = titleHash(records_[(slot & 0xFFFFFFFFu) - 1].title);
+            const std::size_t hash = titleHash(Key::at(text_, (slot & kPlaces) - 1));
             std::size_t i = hash & (slots_.size() - 1);
             while (slots_[i] != 0) i = (i + 1) & (slots_.size() - 1);
             slots_[i] = slot;
         }
     }
 
-    std::vector<std::uint64_t> slots_;  // hash's high half, then record + 1; 0 when free
-    std::vector<Record> records_;
+    std::string_view text_;
+    std::vector<std::uint64_t> slots_;  // hash's high bits, then place + 1; 0 when free
+    std::size_t used_ = 0;
 };
 
 // Whether two titles are the same, compared eight bytes at a time in place: a lookup compares
@@ -130,10 +123,6 @@ inline bool sameTitle(std::string_view a, std::string_view b) {
         if (differ(at)) return false;
     }
     return !differ(size - 8);
-}
-// The same, or the same ignoring Latin-1 case.
-inline bool sameTitleIgnoringCase(std::string_view a, std::string_view b) {
-    return sameTitle(a, b) || (a.size() == b.size() && catalogue::equalsIgnoreCase(a, b));
 }
 
 // Whether `text` holds "&", "<" or ">".
@@ -154,23 +143,32 @@ class EntryIndex {
     // `expected`: about how many titles the text holds (the table grows past it).
     EntryIndex(std::string_view text, std::size_t expected);
 
-    // Fetches what find() needs of a title hashed `hash` (its titleHash()) into the cache.
+    // Fetches the slot of a title hashed `hash` (its titleHash()) into the cache.
     void prefetch(std::size_t hash) const { titles_.prefetch(hash); }
 
     Fields find(std::string_view title) const { return find(title, titleHash(title)); }
-    Fields find(std::string_view title, std::size_t hash) const {
-        const Fields* hit = titles_.find(title, hash);
-        return hit == nullptr ? Fields() : *hit;
-    }
+    Fields find(std::string_view title, std::size_t hash) const;
 
   private:
+    // A title stands after its marker, up to the line's CR.
+    struct TitleKey {
+        static std::string_view at(std::string_view text, std::size_t marker);
+        static bool holds(std::string_view text, std::size_t marker, std::string_view title) {
+            const std::size_t start = marker + 3;
+            return text.size() - start > title.size() && text[start + title.size()] == '\r' &&
+                   sameTitle(text.substr(start, title.size()), title);
+        }
+    };
+
     bool indexPlainEntries();
     void indexMarkedTitles();
+    Fields plainFields(std::size_t typeLine) const;
     std::string_view fieldAfter(std::string_view tag, std::size_t kind, std::size_t& from) const;
     const std::vector<std::size_t>& markers(std::size_t kind, std::string_view tag) const;
 
     std::string_view text_;
-    FlatTitleMap<Fields, sameTitle> titles_;
+    bool plain_ = false;  // the text holds plain entries only
+    PlaceMap<TitleKey> titles_;
     mutable std::optional<std::vector<std::size_t>> markers_[3];  // type, discs, info
 };
 
@@ -182,17 +180,21 @@ class ArticleIndex {
     // `expected`: about how many lines the text holds (the table grows past it).
     ArticleIndex(std::string_view text, std::size_t expected);
 
-    // Fetches what find() needs of a title hashed `hash` (its titleHash()) into the cache.
+    // Fetches the slot of a title hashed `hash` (its titleHash()) into the cache.
     void prefetch(std::size_t hash) const { numbers_.prefetch(hash); }
 
     std::string_view find(std::string_view title) const { return find(title, titleHash(title)); }
-    std::string_view find(std::string_view title, std::size_t hash) const {
-        const std::string_view* hit = numbers_.find(title, hash);
-        return hit == nullptr ? std::string_view() : *hit;
-    }
+    std::string_view find(std::string_view title, std::size_t hash) const;
 
   private:
-    FlatTitleMap<std::string_view, sameTitleIgnoringCase> numbers_;
+    // A title is the start of a line up to a separator on that line.
+    struct LineKey {
+        static std::string_view at(std::string_view text, std::size_t separator);
+        static bool holds(std::string_view text, std::size_t separator, std::string_view title);
+    };
+
+    std::string_view text_;
+    PlaceMap<LineKey> numbers_;
 };
 
 }  // namespace exporting
