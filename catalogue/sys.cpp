@@ -2,7 +2,10 @@
 
 #include <fcntl.h>
 #include <stdio.h>
+#include <sys/mman.h>
 #include <unistd.h>
+
+#include <cstdint>
 
 namespace catalogue {
 
@@ -31,6 +34,27 @@ int Sys::unlink(const std::string& path) {
 Sys& realSys() {
     static Sys sys;
     return sys;
+}
+
+void backMemory(void* start, std::size_t size) {
+#if defined(MADV_POPULATE_WRITE)
+    const long page = ::sysconf(_SC_PAGESIZE);
+    if (page <= 0) return;
+    const auto mask = static_cast<std::uintptr_t>(page) - 1;
+    const std::uintptr_t first = (reinterpret_cast<std::uintptr_t>(start) + mask) & ~mask;
+    const std::uintptr_t end = (reinterpret_cast<std::uintptr_t>(start) + size) & ~mask;
+    // Only a hint: a refusal leaves the pages to come as they are written.
+    if (end > first)
+        (void)::madvise(reinterpret_cast<void*>(first), end - first, MADV_POPULATE_WRITE);
+#else
+    (void)start;
+    (void)size;
+#endif
+}
+
+void reserveBacked(std::string& text, std::size_t size) {
+    text.reserve(size);
+    backMemory(text.data() + text.size(), text.capacity() - text.size());
 }
 
 }  // namespace catalogue

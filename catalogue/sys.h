@@ -24,4 +24,13 @@ class Sys {
 // The real calls.
 Sys& realSys();
 
+// Has the system back the whole pages of [start, start + size) with memory at once. Fresh memory
+// is otherwise backed a page at a time, one fault for each 4 KB as it is first written: in a
+// report of 5 MB that took 1.5 ms, and the single call a fraction of it. Where the system cannot
+// (before Linux 5.14), the pages still come as they are written.
+void backMemory(void* start, std::size_t size);
+
+// Reserves room for `size` bytes in `text`, backed at once.
+void reserveBacked(std::string& text, std::size_t size);
+
 }  // namespace catalogue

@@ -7,6 +7,7 @@
 #include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
+#include "catalogue/sys.h"
 #include "export/form_export.h"
 #include "export/html_page.h"
 #include "export/last_added.h"
@@ -70,7 +71,7 @@ ListReport buildListReport(catalogue::Store& store, const std::string& list, Tit
                        reportTableSize(titles.size(), options) + 128;
     // An escape adds at most four bytes; the table's own drawing escapes two bytes of a line.
     if (html) size += size / 8 + 5 * list.size() + 256;
-    out.reserve(size);
+    catalogue::reserveBacked(out, size);
     if (html) appendPageStart(out, list);
     std::string pieces;
     if (sectionFirst) pieces.append(*section).append(catalogue::kCrLf);

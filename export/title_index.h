@@ -6,6 +6,8 @@
 #include <string_view>
 #include <vector>
 
+#include "catalogue/sys.h"
+
 // Lookups of many titles in one entry text or article text, each text indexed once, so that a
 // report of the largest list costs linear time. They find what the catalogue's one-title lookups
 // find on the same texts.
@@ -54,6 +56,8 @@ class PlaceMap {
     PlaceMap(std::string_view text, std::size_t expected) : text_(text) {
         std::size_t size = 64;
         while (size < expected * 2) size *= 2;
+        slots_.reserve(size);
+        catalogue::backMemory(slots_.data(), size * sizeof(std::uint64_t));
         slots_.resize(size);
     }
 
