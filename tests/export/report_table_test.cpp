@@ -103,21 +103,26 @@ TEST(ReportTable, FieldsOfAHandEditedEntryAreTheFirstMarkersThatFollow) {
 }
 
 // Titles of 7 to 17 bytes, around the eight-byte steps of the lookups: an entry is found only
-// under its exact title, an article number under the title in any case.
+// under its exact title, an article number under the title in any case. The longer types put
+// one, two or all three of an entry's field lines within 64 bytes.
 TEST(ReportTable, TitlesAroundEightBytesFindTheirEntryExactlyAndTheirNumberInAnyCase) {
     std::string entries, articles;
     std::vector<std::string> titles;
+    const auto typeOf = [](std::size_t size) {
+        return "T" + std::to_string(size) + std::string(size * 3 + 6, '.');
+    };
     for (const std::size_t size : {7u, 8u, 9u, 16u, 17u}) {
         const std::string title = std::string(size - 1, 'x') + "A",
                           other = title.substr(0, size - 1);
-        entries += "<|?" + title + "\r\n<|'T" + std::to_string(size) + "\r\n<||1\r\n<|*i\r\n";
+        entries += "<|?" + title + "\r\n<|'" + typeOf(size) + "\r\n<||1\r\n<|*i\r\n";
         articles += other + "a#*\\A" + std::to_string(100 + size) + "\r\n";
         titles.insert(titles.end(), {title, other + "a"});
     }
     const auto lines = linesOf(BuildReportTable("M", entries, articles, titles, {true}, ""));
     for (std::size_t i = 0; i < titles.size(); ++i) {
         const std::string number = "A" + std::to_string(100 + titles[i].size());
-        const std::string type = i % 2 == 0 ? "T" + std::to_string(titles[i].size()) : "";
+        const std::string type =
+            i % 2 == 0 ? exporting::firstChars(typeOf(titles[i].size()), 17) : "";
         EXPECT_EQ(lines[3 + i], "|" + number + "|" + exporting::padded(titles[i], 45) + "|" +
                                     exporting::padded(type, 18) + "|  " +
                                     exporting::padded(type.empty() ? "" : "1", 4) + "|\r\n");
