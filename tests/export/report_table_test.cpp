@@ -11,7 +11,6 @@
 #include "bench/catalogue_maker.h"
 #include "catalogue/records.h"
 #include "export/html_page.h"
-#include "list_order/list_order.h"
 #include "tests/export/export_fixture.h"
 
 namespace {
