@@ -117,6 +117,11 @@ TEST(ReportTable, TitlesAroundEightBytesFindTheirEntryExactlyAndTheirNumberInAny
         articles += other + "a#*\\A" + std::to_string(100 + size) + "\r\n";
         titles.insert(titles.end(), {title, other + "a"});
     }
+    // Entries and lines no row asks for, more than the tables are first made for.
+    for (int i = 0; i < 40; ++i) {
+        entries += "<|?f" + std::to_string(i) + "\r\n<|'\r\n<||\r\n<|*\r\n";
+        articles += "f" + std::to_string(i) + "#*\\F001\r\n";
+    }
     const auto lines = linesOf(BuildReportTable("M", entries, articles, titles, {true}, ""));
     for (std::size_t i = 0; i < titles.size(); ++i) {
         const std::string number = "A" + std::to_string(100 + titles[i].size());
