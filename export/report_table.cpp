@@ -172,31 +172,6 @@ RowShape shapeFor(const ReportOptions& options) {
     return shape;
 }
 
-// The table's lines written into room made in `out` a block at a time, rather than appended
-// piece by piece: each line is then a few copies without a check of the string's size.
-class Lines {
-  public:
-    explicit Lines(std::string& out) : out_(out), used_(out.size()) {}
-
-    // `size` bytes to write at, right after the previous ones.
-    [[gnu::always_inline]] char* room(std::size_t size) {
-        if (out_.size() - used_ < size) out_.resize(std::max(used_ + size, out_.size() + kBlock));
-        char* const at = out_.data() + used_;
-        used_ += size;
-        return at;
-    }
-    void add(std::string_view line) { std::memcpy(room(line.size()), line.data(), line.size()); }
-    // Takes back the last `size` bytes written.
-    void drop(std::size_t size) { used_ -= size; }
-    // Ends the writing: `out` holds what was written and nothing more.
-    void finish() { out_.resize(used_); }
-
-  private:
-    static constexpr std::size_t kBlock = 1 << 16;
-    std::string& out_;
-    std::size_t used_;
-};
-
 std::string escaped(std::string_view text) {
     std::string out;
     appendEscaped(out, text);
@@ -208,7 +183,7 @@ void put(char* to, std::string_view text, std::size_t size) {
 }
 
 // The row as row() writes it, into the blank row where its texts fit (nearly every row).
-void fittedRow(Lines& lines, std::string& scratch, const RowShape& shape,
+void fittedRow(std::string& out, std::string& scratch, const RowShape& shape,
                const ReportOptions& options, std::string_view title, const Fields& fields,
                std::string_view articleNumber) {
     const std::size_t titleSize = std::min(title.size(), shape.titleCut);
@@ -216,11 +191,13 @@ void fittedRow(Lines& lines, std::string& scratch, const RowShape& shape,
     if (titleSize > shape.titleWidth || discsSize > shape.discsWidth || articleNumber.size() > 4) {
         scratch.clear();
         row(scratch, options, title, fields, articleNumber);
-        lines.add(options.html ? escaped(scratch) : scratch);
+        appendText(out, scratch, options.html);
         return;
     }
-    char* const cells = lines.room(kLineSize);
-    std::memcpy(cells, shape.blank.data(), kLineSize);
+    // Appended whole into the room reserved for the report, and then written over in place.
+    const std::size_t at = out.size();
+    out.append(shape.blank);
+    char* const cells = out.data() + at;
     put(cells + shape.article, articleNumber, articleNumber.size());
     put(cells + shape.title, title, titleSize);
     put(cells + shape.type, fields.type, std::min<std::size_t>(fields.type.size(), 17));
@@ -232,8 +209,8 @@ void fittedRow(Lines& lines, std::string& scratch, const RowShape& shape,
     // The blank row escapes nothing: a row of a page that does is written again, escaped.
     if (options.html && needsEscapes({cells, kLineSize})) {
         scratch.assign(cells, kLineSize);
-        lines.drop(kLineSize);
-        lines.add(escaped(scratch));
+        out.resize(at);
+        appendEscaped(out, scratch);
     }
 }
 
@@ -292,7 +269,6 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
     const RowShape shape = shapeFor(options);
     std::string underline = std::string(layout.underline).append(kCrLf);
     if (options.html) underline = escaped(underline);
-    Lines lines(out);
     std::string scratch;
     // Each title is looked up a few rows before its row is written, so that the memory its
     // lookups need is fetched meanwhile.
@@ -310,17 +286,10 @@ void appendReportTable(std::string& out, std::string_view listName, std::string_
         const std::string_view title = titles[i];
         const std::size_t hash = hashes[i % kAhead];
         fetch(i + kAhead);
-        fittedRow(lines, scratch, shape, options, title, entries.find(title, hash),
+        fittedRow(out, scratch, shape, options, title, entries.find(title, hash),
                   options.articleNumbers ? articles.find(title, hash) : std::string_view());
-        if (options.separatorLines && i + 1 < titles.size()) {
-            if (underline.size() == kLineSize) {
-                std::memcpy(lines.room(kLineSize), underline.data(), kLineSize);
-            } else {
-                lines.add(underline);  // escaped for a page
-            }
-        }
+        if (options.separatorLines && i + 1 < titles.size()) out.append(underline);
     }
-    lines.finish();
     std::string bottom;
     bottomLine(bottom, layout, options, titles.size());
     appendText(out, bottom, options.html);
