@@ -214,7 +214,7 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
 TEST_F(ListEdits, AOneFileChangeFlushesTheFolderAfterItsRename) {
     FaultySys sys;
     Store flushed(folder.path(), sys);
-    sys.failAt(SysCall::Fsync, 2, EIO);
+    sys.failNext(SysCall::Fsync, 2, EIO);
     ASSERT_TRUE(changeEntry(flushed, read("Rock"), "Zebra", {"Zebra", "LP", "2", ""}));
     EXPECT_TRUE(sys.fired());
     EXPECT_EQ(sys.calls(SysCall::Fsync), 3);

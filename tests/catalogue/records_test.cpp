@@ -238,7 +238,7 @@ TEST(ListNames, AProbeTheFolderRefusesIsLeftToTheNextStart) {
         test_support::TempFolder folder;
         folder.put("pemla.dat", "Pop\r\n");
         test_support::FaultySys sys;
-        sys.failAt(kind, kind == SysCall::Open ? 2 : 1, kind == SysCall::Open ? EINVAL : EACCES, 2);
+        sys.failNext(kind, kind == SysCall::Open ? 2 : 1, kind == SysCall::Open ? EINVAL : EACCES, 2);
         Store store(folder.path(), sys);
         EXPECT_EQ(checkNewListName(store, "Jazz").refusal, kBadName);
         EXPECT_TRUE(sys.fired());

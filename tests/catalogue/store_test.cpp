@@ -118,7 +118,7 @@ TEST_F(StoreTest, WriteFileAtomicallyReplacesTheFileOrKeepsTheOldOne) {
         SCOPED_TRACE(std::string(sysCallName(kind)) + " #" + std::to_string(n));
         FaultySys sys;
         sys.capWrites(big.size() / 2);
-        sys.failAt(kind, n, errnum);
+        sys.failNext(kind, n, errnum);
         expectError([&] { writeFileAtomically(report, big, sys); }, "Rock.TXT", errnum);
         EXPECT_TRUE(sys.fired());
         EXPECT_EQ(folder.get("Rock.TXT"), "third\r\n");
@@ -210,7 +210,7 @@ TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
     putHalfDone(folder, kHalfDone);
     for (SysCall kind : {SysCall::Open, SysCall::Read}) {
         FaultySys sys;
-        sys.failAt(kind, 1, EIO);
+        sys.failNext(kind, 1, EIO);
         EXPECT_THROW(Store(folder.path(), sys).recover(), CatalogueError) << sysCallName(kind);
         EXPECT_TRUE(sys.fired());
         // Dropping it now would leave a.dat new and b.dat old for good.
@@ -223,7 +223,7 @@ TEST(Recovery, AJournalThatCannotBeReadIsKeptForLater) {
     // A torn journal that cannot be removed is reported, not passed over.
     putHalfDone(folder, kHalfDone.substr(0, kHalfDone.size() - 3));
     FaultySys sys;
-    sys.failAt(SysCall::Unlink, 1, EIO);
+    sys.failNext(SysCall::Unlink, 1, EIO);
     EXPECT_THROW(Store(folder.path(), sys).recover(), CatalogueError);
     EXPECT_TRUE(folder.has(kJournalName));
 }
