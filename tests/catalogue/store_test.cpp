@@ -56,8 +56,9 @@ TEST_F(StoreTest, ReadsAndNamesTheFileAndReasonOfAFailedRead) {
 }
 
 // Replacing a report, and its failed calls where the files show them, are the report sweep's in
-// the fault tests. Here what the files alone would not show: a failed flush or close is reported
-// and keeps the old report; writes may come in short pieces; stale copies of its own go.
+// the fault tests. Here the bytes go as they are, in short pieces if need be; stale copies of its
+// own go; and a failed flush or close, which the files alone would not show, is reported and keeps
+// the old report.
 TEST_F(StoreTest, AtomicWriteTakesShortWritesClearsStaleCopiesAndReportsFailedFlushes) {
     const std::string report = folder.file("Rock.TXT");
     FaultySys shortWrites;
@@ -71,13 +72,14 @@ TEST_F(StoreTest, AtomicWriteTakesShortWritesClearsStaleCopiesAndReportsFailedFl
     folder.put("Rock.TXT.4242.pemla-tmp", "stale");
     folder.put("Rock.TXT.mine.pemla-tmp", "not ours");
     folder.put("Pop.TXT.4242.pemla-tmp", "another report's");
-    writeFileAtomically(report, "third\r\n");
+    writeFileAtomically(report, "third, as it is: no CR LF added");
+    EXPECT_EQ(folder.get("Rock.TXT"), "third, as it is: no CR LF added");
     EXPECT_EQ(folder.listing(), "Pop.TXT.4242.pemla-tmp\nRock.TXT\nRock.TXT.mine.pemla-tmp\n");
     for (const SysCall kind : {SysCall::Fsync, SysCall::Close}) {
         FaultySys sys;
         sys.failNext(kind, 1, EIO);
         expectError([&] { writeFileAtomically(report, "fourth\r\n", sys); }, "Rock.TXT", EIO);
-        EXPECT_EQ(folder.get("Rock.TXT"), "third\r\n") << sysCallName(kind);
+        EXPECT_EQ(folder.get("Rock.TXT"), "third, as it is: no CR LF added") << sysCallName(kind);
     }
 }
 
