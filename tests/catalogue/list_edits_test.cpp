@@ -18,8 +18,6 @@ using Articles = std::vector<std::pair<std::string, std::string>>;
 
 const std::string kSkeletonDat(kSkeletonEntries), kSkeletonArt(kSkeletonArticles);
 const std::string kMarks = ": the list's files use it to mark their records.";
-const Lines& kRockArn = kRockCounter;
-const Articles& kRockArt = kRockArticles;
 
 class ListEdits : public ::testing::Test {
   protected:
@@ -122,9 +120,8 @@ TEST_F(ListEdits, AddRefusesWhatTheFilesCannotHoldOrTheListCannotTakeAndWritesNo
 // "000" stands for a letter whose numbers are all handed out (the counter's own suite hands out
 // the last one and goes on with other letters); neither an add nor a change gets another of it.
 TEST_F(ListEdits, ALettersNumbersEndAt999) {
-    const std::string dat = entryText({{"Bass", "CD", "1", ""}});
-    const std::string art = articleText({{"Bass", "B004"}});
-    folder.putList("Full", dat, art, crlf({"A#000", "B#005"}));
+    folder.putList("Full", entryText({{"Bass", "CD", "1", ""}}), articleText({{"Bass", "B004"}}),
+                   crlf({"A#000", "B#005"}));
     const std::string usedUp =
         "Every article number of the letter A (A001 to A999) has been handed out in this list, "
         "so no other title that files under this letter can be stored in it.";
@@ -164,7 +161,7 @@ TEST_F(ListEdits, ChangeKeepsThePlaceAndKeepsOrRenewsTheNumberByTheFirstLetter) 
             if (e.title == c.from) e = changed;
         }
         Articles art;
-        for (const auto& line : kRockArt) {
+        for (const auto& line : kRockArticles) {
             if (line.first != c.from) {
                 art.push_back(line);
             } else if (c.number.empty()) {
@@ -174,7 +171,7 @@ TEST_F(ListEdits, ChangeKeepsThePlaceAndKeepsOrRenewsTheNumberByTheFirstLetter) 
         if (!c.number.empty()) art.push_back({c.to, c.number});
         EXPECT_EQ(result.entries, entryText(dat));
         expectList("Rock", entryText(dat), articleText(art),
-                   crlf(c.counter.empty() ? kRockArn : c.counter));
+                   crlf(c.counter.empty() ? kRockCounter : c.counter));
     }
 }
 
@@ -189,7 +186,7 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
     folder.remove(("Rock.art"));
     ASSERT_TRUE(changeEntry(store, read("Rock"), "Zebra", {"Zebra", "Vinyl", "4", ""}));
     EXPECT_FALSE(folder.has("Rock.art"));
-    EXPECT_EQ(folder.get("Rock.arn"), crlf(kRockArn));
+    EXPECT_EQ(folder.get("Rock.arn"), crlf(kRockCounter));
     const Files before = snapshot(folder.path());
     EXPECT_THROW(changeEntry(store, read("Rock"), "Zebra", {"Zulu", "CD", "1", ""}),
                  CatalogueError);
@@ -220,12 +217,12 @@ TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
         std::vector<Entry> dat = kRock;
         dat.erase(dat.begin() + static_cast<std::ptrdiff_t>(at));
         Articles art;
-        for (const auto& line : kRockArt) {
+        for (const auto& line : kRockArticles) {
             if (line.first != title) art.push_back(line);
         }
         EXPECT_EQ(result.entries, entryText(dat));
         EXPECT_EQ(result.removedTitle, title);
-        expectList("Rock", entryText(dat), articleText(art), crlf(kRockArn));
+        expectList("Rock", entryText(dat), articleText(art), crlf(kRockCounter));
     }
     // Without an article file, the entry alone goes.
     putRock();
