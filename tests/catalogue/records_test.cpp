@@ -158,7 +158,6 @@ TEST(ArticleNumbers, UsedUpAndDamagedRecordsAreRefusedForTheirLetterOnly) {
         EXPECT_THROW(nextArticleNumber(text, 'a'), std::invalid_argument);
         EXPECT_EQ(counterProblem(text, 'B'), CounterProblem::None);
     }
-    EXPECT_EQ(counterProblem("A#001\r\n", '!'), CounterProblem::None);
 }
 
 // An import counts a letter's numbers on past its last one exactly as Adds one after another do.
