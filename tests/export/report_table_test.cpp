@@ -10,7 +10,6 @@
 
 #include "bench/catalogue_maker.h"
 #include "catalogue/records.h"
-#include "list_order/list_order.h"
 #include "tests/export/export_fixture.h"
 
 namespace {

@@ -8,7 +8,8 @@
 #include "tests/support/memory_form1.h"
 
 // The main window's tests: a catalogue folder with the list "Rock", the entry fields as the
-// user sees them, and the message boxes shown.
+// user sees them, and the message boxes shown. A box the test did not script an answer for
+// fails the test, so a test that scripts none also proves that none was shown.
 namespace main_window_test {
 
 using Strings = std::vector<std::string>;

@@ -15,15 +15,9 @@ MainWindowFixture::MainWindowFixture()
     form->setDialogs({&newListView.window, &exportView.window, nullptr});
 }
 
-bool MainWindowFixture::open(const std::string& list) {
-    const bool shown = view.List_list.userSelect(list);
-    EXPECT_TRUE(shown) << "no list " << list;
-    return shown;
-}
-
-bool MainWindowFixture::select(const std::string& title) {
-    const bool shown = view.List1.userSelect(title);
-    EXPECT_TRUE(shown) << "no title " << title;
+bool MainWindowFixture::pick(ui::memory::MemoryListBox& box, const std::string& item) {
+    const bool shown = box.userSelect(item);
+    EXPECT_TRUE(shown) << "not shown: " << item;
     return shown;
 }
 

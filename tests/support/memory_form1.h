@@ -5,9 +5,7 @@
 #include <vector>
 
 #include "catalogue/store.h"
-#include "export/form_export.h"
 #include "main_window/form1.h"
-#include "new_list/form_new_list.h"
 #include "tests/support/faulty_sys.h"
 #include "tests/support/memory_dialogs.h"
 #include "tests/support/temp_folder.h"
@@ -63,8 +61,9 @@ struct MainWindowFixture {
     void start() { view.window.show(); }
     // The user selects a list, or a title of the open list; false (and a failure) when it is
     // not shown.
-    bool open(const std::string& list);
-    bool select(const std::string& title);
+    bool open(const std::string& list) { return pick(view.List_list, list); }
+    bool select(const std::string& title) { return pick(view.List1, title); }
+    bool pick(ui::memory::MemoryListBox& box, const std::string& item);
     // The user clears the entry fields and types these values; or clears one box and types.
     void fill(const catalogue::Entry& entry);
     template <typename Box>
