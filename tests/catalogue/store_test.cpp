@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <signal.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -57,8 +58,8 @@ TEST_F(StoreTest, ReadsAndNamesTheFileAndReasonOfAFailedRead) {
 
 // Replacing a report, and its failed calls where the files show them, are the report sweep's in
 // the fault tests. Here the bytes go as they are, in short pieces if need be; stale copies of its
-// own go; and a failed flush or close, which the files alone would not show, is reported and keeps
-// the old report.
+// own go; a read-only report is not replaced; and a failed flush or close, which the files alone
+// would not show, is reported and keeps the old report.
 TEST_F(StoreTest, AtomicWriteTakesShortWritesClearsStaleCopiesAndReportsFailedFlushes) {
     const std::string report = folder.file("Rock.TXT");
     FaultySys shortWrites;
@@ -75,6 +76,10 @@ TEST_F(StoreTest, AtomicWriteTakesShortWritesClearsStaleCopiesAndReportsFailedFl
     writeFileAtomically(report, "third, as it is: no CR LF added");
     EXPECT_EQ(folder.get("Rock.TXT"), "third, as it is: no CR LF added");
     EXPECT_EQ(folder.listing(), "Pop.TXT.4242.pemla-tmp\nRock.TXT\nRock.TXT.mine.pemla-tmp\n");
+    // A report its owner made read-only is not replaced.
+    ::chmod(report.c_str(), 0444);
+    expectError([&] { writeFileAtomically(report, "x"); }, "Rock.TXT", EACCES);
+    ::chmod(report.c_str(), 0644);
     for (const SysCall kind : {SysCall::Fsync, SysCall::Close}) {
         FaultySys sys;
         sys.failNext(kind, 1, EIO);
