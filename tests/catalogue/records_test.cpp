@@ -69,6 +69,8 @@ TEST(Records, TitleTagsInsideValuesAreNoEntries) {
     const std::string text = entryText({a, b, c});
     EXPECT_EQ(found(text, "b"), entryLines(b));
     EXPECT_EQ(found(text, "C"), entryLines(c));
+    // A hand-edited type line that looks like B's title line, before B's own.
+    EXPECT_EQ(found("<|?A\r\n<|?B\r\n<||1\r\n<|*i\r\n" + entryLines(b), "B"), entryLines(b));
     EXPECT_EQ(found(entryText({{"A<|?B", "CD", "1", ""}}), "B"), "none");  // inside a title
     const Entry changed{"N", "x", "y", "z"};
     EXPECT_EQ(replaceEntry(text, "A", changed), entryText({changed, b, c}));
