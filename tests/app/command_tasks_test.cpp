@@ -76,11 +76,12 @@ TEST_F(Commands, ImportAddsEachRowAsAddWouldOrSaysWhyNot) {
         std::vector<std::string> refused;  // "line: reason"
     } cases[] = {
         // A byte order mark, columns by name in any case, LF line ends.
-        {"\xEF\xBB\xBFTITLE,Extra,Discs\nZoot,x,3\n\n",
-         0,
+        {"\xEF\xBB\xBFTITLE,Extra,Discs\nZoot,x,3\nBass,y,<||\n\n",
+         3,
          {{{"Zoot", "", "3", ""}, "Z001"}},
          "Z#002\r\n",
-         {}},
+         {"3: The number of discs cannot hold \"<||\": the list's files use it to mark their "
+          "records."}},
         // Latin-1, and titles alike but for the case of accented letters, short and past the
         // sixteenth byte.
         {"title\r\nCaf\xE9\r\n\xC9t\xE9\r\n\xE9T\xC9\r\nLive at the Caf\xE9 Royal\r\n"
