@@ -164,9 +164,10 @@ TEST(HostileIndex, NamesThatAreNoFileNamesAreRefusedAndNoOtherFileIsTouched) {
     putRock(r.folder);
     fs::create_directory(r.folder.path() + "/sub");
     r.folder.put("sub/inner.dat", kAbbaDat);
+    r.folder.put("sub/inn\xE9r.dat", kAbbaDat);  // a name an earlier build would have used
     const std::string names[] = {std::string("pemla.dat\0", 10),
                                  "../" + fs::path(r.folder.path()).filename().string() + "/Rock",
-                                 "sub/inner", std::string(1 << 20, 'n')};
+                                 "sub/inner", "sub/inn\xE9r", std::string(1 << 20, 'n')};
     for (const std::string& name : names) {
         SCOPED_TRACE(name.substr(0, 24));
         r.folder.put("pemla.dat", crlf({"Rock", name}));
@@ -186,7 +187,8 @@ TEST(HostileIndex, NamesThatAreNoFileNamesAreRefusedAndNoOtherFileIsTouched) {
                 << errors[i].prompt.substr(0, 80);
         }
         EXPECT_EQ(r.files(), before) << difference(before, r.files());
-        EXPECT_EQ(snapshot(r.folder.path() + "/sub"), (Files{{"inner.dat", kAbbaDat}}));
+        EXPECT_EQ(snapshot(r.folder.path() + "/sub"),
+                  (Files{{"inner.dat", kAbbaDat}, {"inn\xE9r.dat", kAbbaDat}}));
     }
 }
 
