@@ -197,12 +197,19 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
 
 // A change of one file is made durable by flushing the folder after its rename; a failed flush
 // is tried once more before it would be reported, as the change is made by then.
-TEST_F(ListEdits, AOneFileChangeFlushesTheFolderAfterItsRename) {
+TEST_F(ListEdits, ChangesFlushEveryFileAndTheFolderAfterEachStep) {
     FaultySys sys;
     Store flushed(folder.path(), sys);
     sys.failNext(SysCall::Fsync, 2, EIO);
     ASSERT_TRUE(changeEntry(flushed, read("Rock"), "Zebra", {"Zebra", "LP", "2", ""}));
     EXPECT_EQ(sys.calls(SysCall::Fsync), 3);  // the second failed, and was tried again
+    // An add changes three files through the journal: the three staged files and the journal
+    // are flushed, and the folder once the journal is in it, after the renames (before the
+    // journal may go) and after the journal is gone.
+    FaultySys counted;
+    Store journaled(folder.path(), counted);
+    ASSERT_TRUE(addEntry(journaled, read("Rock"), {"Blues", "LP", "2", ""}));
+    EXPECT_EQ(counted.calls(SysCall::Fsync), 7);
 }
 
 TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
