@@ -75,10 +75,10 @@ TEST_F(Commands, ImportAddsEachRowAsAddWouldOrSaysWhyNot) {
         std::string counter;               // after "A#002", "Q#000"
         std::vector<std::string> refused;  // "line: reason"
     } cases[] = {
-        // A byte order mark, columns by name in any case, LF line ends.
-        {"\xEF\xBB\xBFTITLE,Extra,Discs\nZoot,x,3\nBass,y,<||\n\n",
+        // A byte order mark, columns by name in any case, LF line ends, a field of 17 bytes.
+        {"\xEF\xBB\xBFTITLE,Extra,Discs\nZoot suit riot 17,x,3\nBass,y,<||\n\n",
          3,
-         {{{"Zoot", "", "3", ""}, "Z001"}},
+         {{{"Zoot suit riot 17", "", "3", ""}, "Z001"}},
          "Z#002\r\n",
          {"3: The number of discs cannot hold \"<||\": the list's files use it to mark their "
           "records."}},
