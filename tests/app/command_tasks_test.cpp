@@ -75,18 +75,13 @@ TEST_F(Commands, ImportAddsEachRowAsAddWouldOrSaysWhyNot) {
         std::string counter;               // after "A#002", "Q#000"
         std::vector<std::string> refused;  // "line: reason"
     } cases[] = {
-        {"title,type,discs,information\r\n\"Blur, 13\",\"say \"\"hi\"\"\",2,\"a,b\"\r\n",
-         0,
-         {{{"Blur, 13", "say \"hi\"", "2", "a,b"}, "B001"}},
-         "B#002\r\n",
-         {}},
-        // Columns by name in any case, LF line ends.
-        {"Discs,Extra,TITLE\n3,x,Zoot\n\n", 0, {{{"Zoot", "", "3", ""}, "Z001"}}, "Z#002\r\n", {}},
-        {"\xEF\xBB\xBFtitle,information\r\nCaf\xC3\xA9,na\xC3\xAFve\r\n",
-         0,
-         {{{"Caf\xE9", "", "", "na\xEFve"}, "C001"}},
-         "C#002\r\n",
-         {}},
+        // A byte order mark, columns by name in any case, LF line ends, a field of 17 bytes.
+        {"\xEF\xBB\xBFTITLE,Extra,Discs\nZoot suit riot 17,x,3\nBass,y,<||\n\n",
+         3,
+         {{{"Zoot suit riot 17", "", "3", ""}, "Z001"}},
+         "Z#002\r\n",
+         {"3: The number of discs cannot hold \"<||\": the list's files use it to mark their "
+          "records."}},
         // Latin-1, and titles alike but for the case of accented letters, short and past the
         // sixteenth byte.
         {"title\r\nCaf\xE9\r\n\xC9t\xE9\r\n\xE9T\xC9\r\nLive at the Caf\xE9 Royal\r\n"
@@ -137,14 +132,8 @@ TEST_F(Commands, ImportAddsEachRowAsAddWouldOrSaysWhyNot) {
               "Rock.arn\nRock.art\nRock.dat\nRock.inf\nin.csv\npemla.dat\npemla.lock\n");
 }
 
+// The files of a new list with the rows of a UTF-8 file are the round trip's below.
 TEST_F(Commands, ImportCreatesAMissingListWithExactlyItsRowsOrRefusesTheWholeFile) {
-    Outcome r = import("Jazz", "title,discs\r\nMiles,2\r\nBird,1\r\n");
-    EXPECT_EQ(r.status, 0) << r.err;
-    EXPECT_EQ(r.out, "2 rows added to the list \"Jazz\" (a new list), 0 refused.\n");
-    const Rows jazz = {{{"Miles", "", "2", ""}, "M001"}, {{"Bird", "", "1", ""}, "B001"}};
-    EXPECT_EQ(folder.get("Jazz.dat") + folder.get("Jazz.art"), entries(jazz) + articles(jazz));
-    EXPECT_EQ(folder.get("Jazz.arn") + folder.get("Jazz.inf"), "M#002\r\nB#002\r\n 1 \r\n");
-
     const struct {
         std::string list, csv, err;
     } refusals[] = {
@@ -156,11 +145,11 @@ TEST_F(Commands, ImportCreatesAMissingListWithExactlyItsRowsOrRefusesTheWholeFil
         {"Sal\xC3\xA9", "title\r\n\xC3\xA9t\xC3\xA9\r\n", ""},  // a UTF-8 name is stored as Latin-1
     };
     for (const auto& c : refusals) {
-        r = import(c.list, c.csv);
+        const Outcome r = import(c.list, c.csv);
         if (c.err.empty()) continue;
         EXPECT_EQ(std::pair(r.status, r.err), std::pair(1, "pemla: " + c.err + "\n"));
     }
-    EXPECT_EQ(folder.get("pemla.dat"), "Rock\r\nJazz\r\nSal\xE9\r\n");
+    EXPECT_EQ(folder.get("pemla.dat"), "Rock\r\nSal\xE9\r\n");
     EXPECT_EQ(folder.get(catalogue::articleFile("Sal\xE9")), "\xE9t\xE9#*\\!001\r\n");
     for (const char* list : {"Blues", "type"}) EXPECT_FALSE(folder.has(catalogue::entryFile(list)));
 }
@@ -175,25 +164,28 @@ TEST_F(Commands, ImportStopsAtTheListsCap) {
 }
 
 // Rock's titles with commas, quotes and accents go out as UTF-8 CSV in the list's order and come
-// back in that order into a new list, with new numbers.
+// back in that order into a new list with the information column, with new numbers.
 TEST_F(Commands, CsvRoundTrip) {
     const Rows rock = {kRock[0],
                        {{"Zoo, \"live\"", "LP", "2", "x"}, "Z001"},
-                       {{"\xE9t\xE9", "CD", "1", " padded "}, "!001"}};
+                       {{"\xE9t\xE9", "CD", "1", " na\xEFve "}, "!001"}};
     folder.put("Rock.dat", entries(rock));
     folder.put("Rock.art", articles(rock));
     const std::string csv =
         "title,type,discs,information,article number\r\n"
         "Abba Gold,Music CD,1,Original,A001\r\n"
         "\"Zoo, \"\"live\"\"\",LP,2,x,Z001\r\n"
-        "\xC3\xA9t\xC3\xA9,CD,1,\" padded \",!001\r\n";
+        "\xC3\xA9t\xC3\xA9,CD,1,\" na\xC3\xAFve \",!001\r\n";
     Outcome r = run(folder.path(), {"export", "Rock", "--csv"});
     EXPECT_EQ(std::pair(r.status, r.out), std::pair(0, csv)) << r.err;
     r = run(folder.path(), {"export", "--csv", "Rock", "--output", folder.file("rock.csv")});
     EXPECT_EQ(std::pair(r.status, folder.get("rock.csv")), std::pair(0, csv)) << r.err;
     r = run(folder.path(), {"import", "Copy", folder.file("rock.csv")});
     EXPECT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.out, "3 rows added to the list \"Copy\" (a new list), 0 refused.\n");
     EXPECT_EQ(folder.get("Copy.dat") + folder.get("Copy.art"), entries(rock) + articles(rock));
+    EXPECT_EQ(folder.get("Copy.arn") + folder.get("Copy.inf"),
+              "A#002\r\nZ#002\r\n!#002\r\n 1 \r\n");
 }
 
 TEST_F(Commands, RefusalsNameWhatFailed) {
@@ -214,7 +206,6 @@ TEST_F(Commands, RefusalsNameWhatFailed) {
         const Outcome r = run(folder.path(), c.args);
         EXPECT_EQ(std::tuple(r.status, r.err, r.out), std::tuple(1, "pemla: " + c.err + "\n", ""));
     }
-    EXPECT_EQ(folder.get("Rock.dat"), entries(kRock));
 }
 
 // A folder that a running window holds is not written: no journal finished, no row imported.
@@ -258,7 +249,6 @@ TEST(CommandExport, WritesWhatTheExportDialogWrites) {
         const Outcome r = run(f.main.folder.path(), args);
         EXPECT_EQ(r.status, 0) << r.err;
         EXPECT_EQ(r.out, written) << html;
-        EXPECT_NE(written.find("Top text"), std::string::npos);
     }
 }
 

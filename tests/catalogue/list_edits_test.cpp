@@ -18,8 +18,6 @@ using Articles = std::vector<std::pair<std::string, std::string>>;
 
 const std::string kSkeletonDat(kSkeletonEntries), kSkeletonArt(kSkeletonArticles);
 const std::string kMarks = ": the list's files use it to mark their records.";
-const Lines& kRockArn = kRockCounter;
-const Articles& kRockArt = kRockArticles;
 
 class ListEdits : public ::testing::Test {
   protected:
@@ -85,13 +83,9 @@ TEST_F(ListEdits, AddAppendsTheEntryAndTheNextNumberOfItsFirstLetter) {
 
 TEST_F(ListEdits, AddRefusesWhatTheFilesCannotHoldOrTheListCannotTakeAndWritesNothing) {
     std::vector<std::tuple<Entry, Refused, std::string>> cases = {
-        {{"", "CD", "1", "Copy"}, Refused::BadEntry, "Please type a title first."},
         {{"Dots#*\\here", "CD", "1", "Copy"},
          Refused::BadEntry,
          "The title cannot hold \"#*\\\"" + kMarks},
-        {{"Line\nbreak", "CD", "1", "Copy"},
-         Refused::BadEntry,
-         "The title cannot hold a line break" + kMarks},
         {{"Title", "CD", "1", "a\rb"},
          Refused::BadEntry,
          "The information cannot hold a line break" + kMarks},
@@ -124,11 +118,10 @@ TEST_F(ListEdits, AddRefusesWhatTheFilesCannotHoldOrTheListCannotTakeAndWritesNo
 }
 
 // "000" stands for a letter whose numbers are all handed out (the counter's own suite hands out
-// the last one); neither an add nor a change gets another number of it, and other letters go on.
+// the last one and goes on with other letters); neither an add nor a change gets another of it.
 TEST_F(ListEdits, ALettersNumbersEndAt999) {
-    const std::string dat = entryText({{"Bass", "CD", "1", ""}});
-    const std::string art = articleText({{"Bass", "B004"}});
-    folder.putList("Full", dat, art, crlf({"A#000", "B#005"}));
+    folder.putList("Full", entryText({{"Bass", "CD", "1", ""}}), articleText({{"Bass", "B004"}}),
+                   crlf({"A#000", "B#005"}));
     const std::string usedUp =
         "Every article number of the letter A (A001 to A999) has been handed out in this list, "
         "so no other title that files under this letter can be stored in it.";
@@ -137,9 +130,6 @@ TEST_F(ListEdits, ALettersNumbersEndAt999) {
                   usedUp, before);
     expectRefused(changeEntry(store, read("Full"), "Bass", {"Aqua", "CD", "1", ""}),
                   Refused::NumbersUsedUp, usedUp, before);
-    EXPECT_EQ(addEntry(store, read("Full"), {"Bongo", "CD", "1", ""}).articleNumber, "B005");
-    expectList("Full", dat + entryText({{"Bongo", "CD", "1", ""}}),
-               art + articleText({{"Bongo", "B005"}}), crlf({"A#000", "B#006"}));
 }
 
 // A change keeps the entry's place. A new title keeps its number and line when its first letter
@@ -171,7 +161,7 @@ TEST_F(ListEdits, ChangeKeepsThePlaceAndKeepsOrRenewsTheNumberByTheFirstLetter) 
             if (e.title == c.from) e = changed;
         }
         Articles art;
-        for (const auto& line : kRockArt) {
+        for (const auto& line : kRockArticles) {
             if (line.first != c.from) {
                 art.push_back(line);
             } else if (c.number.empty()) {
@@ -181,7 +171,7 @@ TEST_F(ListEdits, ChangeKeepsThePlaceAndKeepsOrRenewsTheNumberByTheFirstLetter) 
         if (!c.number.empty()) art.push_back({c.to, c.number});
         EXPECT_EQ(result.entries, entryText(dat));
         expectList("Rock", entryText(dat), articleText(art),
-                   crlf(c.counter.empty() ? kRockArn : c.counter));
+                   crlf(c.counter.empty() ? kRockCounter : c.counter));
     }
 }
 
@@ -189,18 +179,14 @@ TEST_F(ListEdits, ChangeKeepsThePlaceAndKeepsOrRenewsTheNumberByTheFirstLetter) 
 // keeps the title needs no article file, one that renames does.
 TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRename) {
     const Articles art = {{"xabc", "X001"}, {"ABC", "B123"}};
-    for (const std::string title : {"abcd", "Zebra"}) {
-        putRock();
-        folder.put("Rock.art", articleText(art));
-        ASSERT_TRUE(changeEntry(store, read("Rock"), title, {title, "Vinyl", "1", ""}));
-        EXPECT_EQ(folder.get("Rock.art"),
-                  articleText(art) + articleText({{title, title == "abcd" ? "A003" : "Z002"}}));
-    }
+    folder.put("Rock.art", articleText(art));
+    ASSERT_TRUE(changeEntry(store, read("Rock"), "abcd", {"abcd", "Vinyl", "1", ""}));
+    EXPECT_EQ(folder.get("Rock.art"), articleText(art) + articleText({{"abcd", "A003"}}));
     putRock();
     folder.remove(("Rock.art"));
     ASSERT_TRUE(changeEntry(store, read("Rock"), "Zebra", {"Zebra", "Vinyl", "4", ""}));
     EXPECT_FALSE(folder.has("Rock.art"));
-    EXPECT_EQ(folder.get("Rock.arn"), crlf(kRockArn));
+    EXPECT_EQ(folder.get("Rock.arn"), crlf(kRockCounter));
     const Files before = snapshot(folder.path());
     EXPECT_THROW(changeEntry(store, read("Rock"), "Zebra", {"Zulu", "CD", "1", ""}),
                  CatalogueError);
@@ -211,13 +197,19 @@ TEST_F(ListEdits, ChangeGivesATitleWithoutALineOneAndNeedsTheArticleFileOnlyToRe
 
 // A change of one file is made durable by flushing the folder after its rename; a failed flush
 // is tried once more before it would be reported, as the change is made by then.
-TEST_F(ListEdits, AOneFileChangeFlushesTheFolderAfterItsRename) {
+TEST_F(ListEdits, ChangesFlushEveryFileAndTheFolderAfterEachStep) {
     FaultySys sys;
     Store flushed(folder.path(), sys);
-    sys.failAt(SysCall::Fsync, 2, EIO);
+    sys.failNext(SysCall::Fsync, 2, EIO);
     ASSERT_TRUE(changeEntry(flushed, read("Rock"), "Zebra", {"Zebra", "LP", "2", ""}));
-    EXPECT_TRUE(sys.fired());
-    EXPECT_EQ(sys.calls(SysCall::Fsync), 3);
+    EXPECT_EQ(sys.calls(SysCall::Fsync), 3);  // the second failed, and was tried again
+    // An add changes three files through the journal: the three staged files and the journal
+    // are flushed, and the folder once the journal is in it, after the renames (before the
+    // journal may go) and after the journal is gone.
+    FaultySys counted;
+    Store journaled(folder.path(), counted);
+    ASSERT_TRUE(addEntry(journaled, read("Rock"), {"Blues", "LP", "2", ""}));
+    EXPECT_EQ(counted.calls(SysCall::Fsync), 7);
 }
 
 TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
@@ -232,13 +224,12 @@ TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
         std::vector<Entry> dat = kRock;
         dat.erase(dat.begin() + static_cast<std::ptrdiff_t>(at));
         Articles art;
-        for (const auto& line : kRockArt) {
+        for (const auto& line : kRockArticles) {
             if (line.first != title) art.push_back(line);
         }
         EXPECT_EQ(result.entries, entryText(dat));
         EXPECT_EQ(result.removedTitle, title);
-        EXPECT_EQ(result.stamp, store.stampOf("Rock.dat"));
-        expectList("Rock", entryText(dat), articleText(art), crlf(kRockArn));
+        expectList("Rock", entryText(dat), articleText(art), crlf(kRockCounter));
     }
     // Without an article file, the entry alone goes.
     putRock();
@@ -248,16 +239,15 @@ TEST_F(ListEdits, DeleteRemovesTheEntryAndItsArticleLineOnly) {
     EXPECT_THROW(deleteEntry(store, read("Rock"), "Gone"), CatalogueError);
 }
 
-// A list that did not load whole is never written from what was read.
-TEST_F(ListEdits, AListNotReadWholeIsLeftUnchanged) {
+// A list that did not load whole is never written from what was read. (An add is refused
+// before it could be, by the damaged-file table in the fault tests.)
+TEST_F(ListEdits, AChangeOrDeleteLeavesAListNotReadWholeUnchanged) {
     OpenList partial = read("Rock");
     partial.whole = false;
     const std::string words =
         "The list \"Rock\" could not be read whole, so it is left unchanged. Open it again once "
         "its files are in order.";
     const Files before = snapshot(folder.path());
-    expectRefused(addEntry(store, partial, {"New", "CD", "1", ""}), Refused::NotReadWhole, words,
-                  before);
     expectRefused(changeEntry(store, partial, "Zebra", {"Zebra", "CD", "1", ""}),
                   Refused::NotReadWhole, words, before);
     expectRefused(deleteEntry(store, partial, "Zebra"), Refused::NotReadWhole, words, before);
@@ -267,30 +257,11 @@ TEST_F(ListEdits, AListNotReadWholeIsLeftUnchanged) {
 TEST_F(ListEdits, DeletingTheOnlyEntryWritesTheSkeleton) {
     folder.putList("Solo", entryText({{"Jazz Album", "CD", "2", "Copy"}}),
                    articleText({{"Jazz Album", "J001"}}), crlf({"A#004", "J#002"}), " 0 \r\n");
-    for (const std::string list : {"Solo", "Jazz"}) {
-        SCOPED_TRACE(list);
-        const std::string flag = folder.get(list + ".inf");
-        const EditResult result = deleteEntry(store, read(list), "whatever is selected");
-        ASSERT_TRUE(result);
-        EXPECT_TRUE(result.emptied);
-        expectList(list, kSkeletonDat, kSkeletonArt, "A#001\r\n");
-        EXPECT_EQ(folder.get(list + ".inf"), flag);
-    }
-}
-
-TEST_F(ListEdits, DeleteListRemovesItsFilesAndItsOwnIndexLine) {
-    // "abc" lacks its counter and flag files: the rest goes all the same.
-    const Lines lists = {"xabc", "abcd", "abc", "Jazz"};
-    for (const std::string& list : lists) folder.putList(list, kSkeletonDat, kSkeletonArt);
-    folder.remove(("abc.arn"));
-    folder.remove(("abc.inf"));
-    folder.put("pemla.dat", crlf(lists));
-    Files expected = snapshot(folder.path());
-    expected.erase("abc.dat");
-    expected.erase("abc.art");
-    expected["pemla.dat"] = crlf({"xabc", "abcd", "Jazz"});
-    deleteList(store, "abc", store.stampOf(kIndexFile), false, nullptr);
-    EXPECT_EQ(snapshot(folder.path()), expected);
+    const EditResult result = deleteEntry(store, read("Solo"), "whatever is selected");
+    ASSERT_TRUE(result);
+    EXPECT_TRUE(result.emptied);
+    expectList("Solo", kSkeletonDat, kSkeletonArt, "A#001\r\n");
+    EXPECT_EQ(folder.get("Solo.inf"), " 0 \r\n");
 }
 
 // The last list gives way to the placeholder list; the placeholder list itself, with an entry
@@ -316,15 +287,9 @@ TEST_F(ListEdits, DeletingTheOnlyListLeavesThePlaceholderList) {
     }
 }
 
-TEST_F(ListEdits, CreateWritesTheIndexLineAndAnEmptyListOrRefusesTheName) {
-    for (const int flag : {1, 0}) {
-        const std::string name = "Blues" + std::to_string(flag);
-        const std::string index = folder.get("pemla.dat");
-        ASSERT_TRUE(createList(store, name, flag));
-        EXPECT_EQ(folder.get("pemla.dat"), index + name + "\r\n");
-        expectList(name, kSkeletonDat, kSkeletonArt, "A#001\r\n");
-        EXPECT_EQ(folder.get(name + ".inf"), " " + std::to_string(flag) + " \r\n");
-    }
+// The files a new list gets are held byte for byte by the end-to-end run and its flag by the
+// new-list dialog's test; here the refusals, each writing nothing.
+TEST_F(ListEdits, CreateRefusesATakenOrBadNameAndAFullCatalogue) {
     const Files before = snapshot(folder.path());
     // Which names are taken is the list names' test; a refused one writes nothing.
     expectRefused(createList(store, "rock", 1), Refused::NameInUse, kNameInUse, before);

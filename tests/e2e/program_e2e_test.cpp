@@ -6,6 +6,7 @@
 #include <QFileSystemModel>
 #include <QTest>
 #include <QTreeView>
+#include <QWindow>
 #include <cstdlib>
 #include <filesystem>
 
@@ -31,6 +32,18 @@ void expectFolder(const std::string& folder, const std::string& expectedFolder,
     EXPECT_EQ(test_support::snapshot(folder), expected) << expectedFolder;
 }
 
+// A dialog is a window of its own above the main window, not one of its children, so that
+// disabling the main window leaves the dialog usable; it opens with the focus on its text box.
+void expectOwnWindowAbove(QWidget* dialog, QWidget* main, QWidget* focus, const char* title) {
+    EXPECT_TRUE(dialog->isVisible() && dialog->isWindow() && dialog->isEnabled());
+    EXPECT_EQ(dialog->parentWidget(), nullptr);
+    ASSERT_NE(dialog->windowHandle(), nullptr);
+    EXPECT_EQ(dialog->windowHandle()->transientParent(), main->windowHandle());
+    EXPECT_FALSE(main->isEnabled());
+    EXPECT_EQ(dialog->windowTitle(), QString::fromLatin1(title));
+    EXPECT_EQ(dialog->focusWidget(), focus);
+}
+
 TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     test_support::TempFolder work, home;
     ::setenv("HOME", home.path().c_str(), 1);  // the export dialog's first output folder
@@ -46,11 +59,24 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     ASSERT_TRUE(main.widget()->isVisible());
     ASSERT_EQ(rows(main.List_list), 1);
 
-    // A new list, with its information column.
+    // A new list, with its information column. Enter and Escape do nothing, in the name box and
+    // on a focused button alike; the close box gives the main window back.
     click(main.Command_create);
     app::NewListView& newList = program.newListDialog();
+    expectOwnWindowAbove(newList.widget(), main.widget(), newList.Text1, "Create new list");
+    EXPECT_EQ(newList.Text1->maxLength(), 26);
+    QTest::keyClicks(newList.Text1, QStringLiteral("Jazz"));
+    QTest::keyClick(newList.Text1, Qt::Key_Return);
+    QTest::keyClick(newList.Text1, Qt::Key_Escape);
+    newList.Command1->setFocus();
+    QTest::keyClick(newList.Command1, Qt::Key_Return);
+    QTest::keyClick(newList.Command1, Qt::Key_Enter);
+    QTest::keyClick(newList.Command2, Qt::Key_Escape);
     ASSERT_TRUE(newList.widget()->isVisible());
-    QTest::keyClicks(newList.Text1, QStringLiteral("Films"));
+    newList.widget()->close();
+    ASSERT_TRUE(!newList.widget()->isVisible() && main.widget()->isEnabled());
+    click(main.Command_create);
+    retype(newList.Text1, "Films");
     click(newList.Command1);
     ASSERT_TRUE(main.widget()->isEnabled());
     pick(main.List_list, QStringLiteral("Films"));
@@ -83,13 +109,18 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     EXPECT_EQ(boxes.take(), Shown{"Change item: Are ya sure yo want to DELETE selected entry?"});
     EXPECT_EQ(rows(main.List1), 3);
 
-    // The search finds the changed title by its number, typed in small letters.
+    // The search finds the changed title by its number, typed in small letters; the box takes
+    // four characters, and Enter does not search.
     click(main.Command_search);
     app::SearchView& search = program.searchDialog();
-    QTest::keyClicks(search.Text1, QStringLiteral("z001"));
+    expectOwnWindowAbove(search.widget(), main.widget(), search.Text1, "Search article number");
+    QTest::keyClicks(search.Text1, QStringLiteral("z0011"));
+    QTest::keyClick(search.Text1, Qt::Key_Return);
+    QTest::keyClick(search.Text1, Qt::Key_Escape);
+    EXPECT_EQ(search.Text2->text(), QString());
     click(search.Command_search);
     EXPECT_EQ(search.Text2->text(), QString::fromLatin1("Zazie dans le m\xe9tro"));
-    click(search.Command_cancel);
+    search.widget()->close();
     ASSERT_TRUE(main.widget()->isEnabled());
 
     // Export: first as text with article numbers and the last two added below the table.
@@ -133,6 +164,16 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
 
     expectFolder(work.path(), "end", reports);
     EXPECT_EQ(boxes.take(), Shown{});
+
+    // Without its article file a list cannot be searched: the box names the file, and the
+    // dialog never stays open over a disabled main window.
+    fs::remove(work.file("Games.art"));
+    pick(main.List_list, QStringLiteral("Games"));
+    click(main.Command_search);
+    const Shown shown = boxes.take();
+    ASSERT_EQ(shown.size(), 1u);
+    EXPECT_NE(shown[0].find("\"Games.art\""), std::string::npos) << shown[0];
+    EXPECT_TRUE(!search.widget()->isVisible() && main.widget()->isEnabled());
 }
 
 }  // namespace

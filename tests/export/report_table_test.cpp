@@ -73,16 +73,19 @@ TEST(ReportTable, EmptyTableMissingEntriesAndOversizedRows) {
               "'----'-[total titles: 0]---------------------------'------------------'------'\r\n");
 
     // "Ghost" has neither entry nor article line; entries match exactly, article lines in any
-    // case, and the first that matches wins.
+    // case, accented letters too, and the first that matches wins.
     const std::string entries =
-        "<|?HEAT\r\n<|'Music CD\r\n<||9\r\n<|*x\r\n<|?Heat\r\n<|'Game\r\n<||3\r\n<|*Copy\r\n";
-    const auto lines = linesOf(BuildReportTable("M", entries, "heat#*\\H009\r\nHeat#*\\H001\r\n",
-                                                {"Ghost", "Heat"}, {true, true}, ""));
-    ASSERT_EQ(lines.size(), 6u);
+        "<|?HEAT\r\n<|'Music CD\r\n<||9\r\n<|*x\r\n<|?Heat\r\n<|'Game\r\n<||3\r\n<|*Copy\r\n"
+        "<|?Caf\xE9 au lait\r\n<|'LP\r\n<||1\r\n<|*y\r\n";
+    const auto lines = linesOf(BuildReportTable(
+        "M", entries, "heat#*\\H009\r\nHeat#*\\H001\r\nCAF\xC9 AU LAIT#*\\C001\r\n",
+        {"Ghost", "Heat", "Caf\xE9 au lait"}, {true, true}, ""));
+    ASSERT_EQ(lines.size(), 7u);
     EXPECT_EQ(lines[3],
               "|    |Ghost                      |                  |      |                 |\r\n");
     EXPECT_EQ(lines[4],
               "|H009|Heat                       |Game              |  3   |Copy             |\r\n");
+    EXPECT_EQ(lines[5].substr(0, 6), "|C001|");
 
     // 27 characters of date leave no room for dashes, and titles are never cut in the
     // layouts without information: both lines grow.

@@ -21,7 +21,7 @@ struct Operation {
     const char* name;
     const char* list;   // opened before the action, if any
     const char* entry;  // selected before the action, if any
-    int exportDialog;   // -1: closed; 0, 1: open on text or HTML settings
+    bool exportDialog;  // opened before the action
     std::vector<Answer> answers;
     void (*act)(Rig&);
     bool onlyList = false;      // the index holds "Solo" alone
@@ -64,22 +64,21 @@ void restart(Rig& r) {
 const Answer kYes = Answer::Yes;
 // clang-format off
 const Operation kOperations[] = {
-    {"AddEntry", "Rock", nullptr, -1, {}, [](Rig& r) { type(r, "Dylan", r.view.Command_add); }},
-    {"ChangeKeepingTheLetter", "Rock", "abc", -1, {kYes},
+    {"AddEntry", "Rock", nullptr, false, {}, [](Rig& r) { type(r, "Dylan", r.view.Command_add); }},
+    {"ChangeKeepingTheLetter", "Rock", "abc", false, {kYes},
      [](Rig& r) { type(r, "Abbey Road", r.view.Command_change); }},
-    {"ChangeToAnotherLetter", "Rock", "abc", -1, {kYes},
+    {"ChangeToAnotherLetter", "Rock", "abc", false, {kYes},
      [](Rig& r) { type(r, "Zappa", r.view.Command_change); }},
-    {"DeleteOneOfSeveralEntries", "Rock", "xabc", -1, {kYes}, deleteEntry},
-    {"DeleteTheOnlyEntry", "Solo", "Miles", -1, {kYes}, deleteEntry},
-    {"DeleteOneOfSeveralLists", "Jazz", nullptr, -1, {kYes, kYes}, deleteList},
-    {"DeleteTheOnlyList", "Solo", nullptr, -1, {kYes, kYes}, deleteList, true},
-    {"CreateList", nullptr, nullptr, -1, {}, [](Rig& r) { r.createList("Blues"); }},
-    {"SaveExportSettings", "Rock", nullptr, 0, {}, saveExportSettings},
-    {"WriteReportAsText", "Rock", nullptr, 0, {Answer::Ok}, writeReport},
-    {"WriteReportAsHtml", "Rock", nullptr, 1, {Answer::Ok}, writeReport},
-    {"ImportIntoAList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Solo"); }},
-    {"ImportIntoANewList", nullptr, nullptr, -1, {}, [](Rig& r) { importRows(r, "Blues"); }},
-    {"RenameFilesOfAnEarlierBuild", nullptr, nullptr, -1, {}, restart, false, true},
+    {"DeleteOneOfSeveralEntries", "Rock", "xabc", false, {kYes}, deleteEntry},
+    {"DeleteTheOnlyEntry", "Solo", "Miles", false, {kYes}, deleteEntry},
+    {"DeleteOneOfSeveralLists", "Jazz", nullptr, false, {kYes, kYes}, deleteList},
+    {"DeleteTheOnlyList", "Solo", nullptr, false, {kYes, kYes}, deleteList, true},
+    {"CreateList", nullptr, nullptr, false, {}, [](Rig& r) { r.createList("Blues"); }},
+    {"SaveExportSettings", "Rock", nullptr, true, {}, saveExportSettings},
+    {"WriteReportAsText", "Rock", nullptr, true, {Answer::Ok}, writeReport},
+    {"ImportIntoAList", nullptr, nullptr, false, {}, [](Rig& r) { importRows(r, "Solo"); }},
+    {"ImportIntoANewList", nullptr, nullptr, false, {}, [](Rig& r) { importRows(r, "Blues"); }},
+    {"RenameFilesOfAnEarlierBuild", nullptr, nullptr, false, {}, restart, false, true},
 };
 // clang-format on
 
@@ -88,14 +87,13 @@ void PrintTo(const Operation& op, std::ostream* out) {
 }
 
 // Rock has five entries, Jazz the skeleton, Solo one entry; the export settings name the
-// output folder, with every box clear but HTML when the operation asks.
+// output folder, with every box clear. (A page goes through the same write as a text report.)
 void setUp(Rig& r, const Operation& op) {
     putRock(r.folder, {"Jazz"});
     r.folder.putList("Solo", entryText({{"Miles", "Music CD", "1", "Original"}}),
                      crlf({"Miles#*\\M001"}), crlf({"M#002"}));
     r.folder.put("pemla.dat", op.onlyList ? crlf({"Solo"}) : crlf({"Rock", "Jazz", "Solo"}));
-    const char* html = op.exportDialog == 1 ? "1" : "0";
-    r.folder.put("export.dat", crlf({r.out.path(), "0", html, "0", "0", "0", "0", "10", "Top"}));
+    r.folder.put("export.dat", crlf({r.out.path(), "0", "0", "0", "0", "0", "0", "10", "Top"}));
     if (op.earlierBuild) {
         r.folder.putList("B\xFChne", kAbbaDat, crlf({"Abba Gold#*\\A001"}), crlf({"A#002"}));
         r.folder.put("pemla.dat", crlf({"Rock", "B\xFChne"}));
@@ -103,7 +101,7 @@ void setUp(Rig& r, const Operation& op) {
     }
     r.start();
     if ((op.list != nullptr && !r.open(op.list)) || (op.entry != nullptr && !r.select(op.entry)) ||
-        (op.exportDialog >= 0 && !r.view.Command_export.click())) {
+        (op.exportDialog && !r.view.Command_export.click())) {
         throw std::runtime_error("set-up failed");
     }
 }

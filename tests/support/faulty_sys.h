@@ -29,14 +29,10 @@ class FaultySys : public catalogue::Sys {
     };
     ~FaultySys() override;
 
-    // The n-th call (counting from 1) of `kind` fails with `errnum` without taking effect, and
-    // so do the `times` - 1 calls of that kind after it.
-    void failAt(SysCall kind, int n, int errnum, int times = 1) {
-        planned_ = {kind, n, errnum, times};
-    }
-    // The same, counting from now on.
+    // The n-th call of `kind` from now on (counting from 1) fails with `errnum` without taking
+    // effect, and so do the `times` - 1 calls of that kind after it.
     void failNext(SysCall kind, int n, int errnum, int times = 1) {
-        failAt(kind, calls(kind) + n, errnum, times);
+        planned_ = {kind, calls(kind) + n, errnum, times};
     }
     // The n-th call of any kind from now on kills the process before it is made.
     void killAt(int n) { killStep_ = steps_ + n; }
