@@ -139,8 +139,9 @@ TEST(ReportTable, TitlesAroundEightBytesFindTheirEntryExactlyAndTheirNumberInAny
 // A page's table is the text table escaped, for rows copied into their cells and rows written
 // whole alike, from plain entries and from a hand-edited text.
 TEST(ReportTable, PageTableIsTheTextTableEscaped) {
-    const std::vector<std::string> titles = {"Tom & Jerry", "<Heat>", "Gone", "Nowhere & <x>"};
-    const std::string articles = "<heat>#*\\H&01\r\nTom & jerry#*\\T001\r\n";
+    const std::vector<std::string> titles = {"Tom & Jerry", "<Heat>", "Gone", "Nowhere & <x>",
+                                             "Plain"};
+    const std::string articles = "<heat>#*\\H&01\r\nTom & jerry#*\\T001\r\nPlain#*\\P<1>\r\n";
     for (const std::string entries :
          {"<|?Tom & Jerry\r\n<|'Cartoon\r\n<||1\r\n<|*A > B\r\n<|?<Heat>\r\n<|'Film\r\n"
           "<||2\r\n<|*\r\n<|?Gone\r\n<|'Game\r\n<||1234567\r\n<|*Copy\r\n",
