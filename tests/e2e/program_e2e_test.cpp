@@ -4,6 +4,8 @@
 #include <gtest/gtest.h>
 
 #include <QFileSystemModel>
+#include <QLabel>
+#include <QProcess>
 #include <QTest>
 #include <QTreeView>
 #include <QWindow>
@@ -56,8 +58,28 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
     app::Program program(work.path(), platform);
     app::MainWindowView& main = program.mainWindow();
     program.start();
-    ASSERT_TRUE(main.widget()->isVisible());
+    EXPECT_EQ(main.widget()->windowTitle(), QStringLiteral("Pemla 0.90Beta"));
     ASSERT_EQ(rows(main.List_list), 1);
+
+    // The real program started a second time on this folder ends with its message and status 3,
+    // writing nothing, and this window goes on. The second copy runs on a display of its own,
+    // where xdotool answers its "Error" box; a copy that opened its main window instead is ended
+    // after 30 seconds, and the test fails.
+    QProcess second;
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.remove(QStringLiteral("QT_QPA_PLATFORM"));
+    second.setProcessEnvironment(environment);
+    second.start(QStringLiteral("timeout"),
+                 {"-k", "5", "30", "xvfb-run", "-a", "sh", "-c",
+                  "\"$0\" --data \"$1\" & id=$(timeout 25 xdotool search --sync --onlyvisible "
+                  "--name '^Error$' | head -n 1) && xdotool windowfocus --sync \"$id\" key Return; "
+                  "wait $!",
+                  PEMLA_BINARY, QString::fromStdString(work.path())});
+    ASSERT_TRUE(second.waitForFinished(50000)) << "the second copy did not end";
+    EXPECT_EQ(std::pair(second.exitStatus(), second.exitCode()), std::pair(QProcess::NormalExit, 3))
+        << "124 or 137: the second copy ran on for 30 seconds; "
+        << second.readAllStandardError().toStdString();
+    expectFolder(work.path(), "start");
 
     // A new list, with its information column. Enter and Escape do nothing, in the name box and
     // on a focused button alike; the close box gives the main window back.
@@ -92,6 +114,10 @@ TEST(ProgramEndToEnd, CreateFillEditSearchExportAndDeleteAList) {
         click(main.Command_add);
     }
     ASSERT_EQ(rows(main.List1), 4);
+    EXPECT_EQ(main.Label2->text(), QStringLiteral("... amount:  4 ..."));
+    // After the reset, Down starts again at the first suggestion.
+    QTest::keyClick(main.Combo1, Qt::Key_Down);
+    EXPECT_EQ(main.Combo1->currentText(), QStringLiteral("DVD video"));
 
     // Brazil becomes a title of another letter: it gets a new article number.
     pick(main.List1, QStringLiteral("Brazil"));
