@@ -128,9 +128,7 @@ TYPED_TEST(ControlContract, ListBoxKeepsOneOrderAndOneSelectionAndClicksForTheUs
     for (int i = 0; i < list.count(); ++i) EXPECT_EQ(list.selected(i), i == 4) << i;
     list.setSelected(4, false);
 
-    // Filled again with one item more and one less, as after an add or a delete: same order,
-    // nothing selected.
-    list.setItems(Strings{"z", "b", "ABD", "Abc", "abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9"});
+    // Filled again, as after an open: the same order, nothing selected.
     list.setItems(Strings{"z", "b", "ABD", "Abc", "\xE9t\xE9", "aB", "new", "\xC9T\xC9", "c"});
     EXPECT_EQ(items(),
               (Strings{"aB", "Abc", "ABD", "b", "c", "new", "z", "\xC9T\xC9", "\xE9t\xE9"}));
