@@ -29,6 +29,13 @@ inline Line lineAt(std::string_view bytes, std::size_t at) {
     return {bytes.substr(at, cr - at), next};
 }
 
+// Whether a line starts at `at` by the line rule: at the start, after a CR, or after the LF that
+// follows a CR (the LF itself, belonging to the line end, starts none).
+inline bool startsLine(std::string_view bytes, std::size_t at) {
+    return at == 0 || (bytes[at - 1] == '\r' && bytes[at] != '\n') ||
+           (bytes[at - 1] == '\n' && at >= 2 && bytes[at - 2] == '\r');
+}
+
 // Splits file bytes into lines by the line rule. An empty file has no lines; a lone LF is data.
 std::vector<std::string_view> splitLines(std::string_view bytes);
 

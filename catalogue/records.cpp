@@ -30,12 +30,6 @@ std::size_t lineEnd(std::string_view text, std::size_t at) {
     return lineAt(text, at).next;
 }
 
-// Whether a line of the text starts at `at`: at the start, or right after a line end.
-bool startsLine(std::string_view text, std::size_t at) {
-    return at == 0 || text[at - 1] == '\r' ||
-           (text[at - 1] == '\n' && at >= 2 && text[at - 2] == '\r');
-}
-
 // The entry whose title line starts at `at`: its four lines, or up to the end of a text that
 // stops short of them.
 EntrySpan spanOf(std::string_view text, std::size_t at) {

@@ -4,6 +4,7 @@
 #include <bit>
 
 #include "catalogue/byte_scan.h"
+#include "catalogue/file_text.h"
 #include "catalogue/latin1.h"
 #include "catalogue/records.h"
 
@@ -46,13 +47,6 @@ template <const std::string_view& Tag>
     value = std::string_view(text.data() + at + 3, end - at - 3);
     at = end + 2;
     return true;
-}
-
-// Where a line starts by the line rule: at the text's start, after a CR, or after the LF that
-// follows a CR.
-bool startsLine(std::string_view text, std::size_t at) {
-    return at == 0 || (text[at - 1] == '\r' && text[at] != '\n') ||
-           (text[at - 1] == '\n' && at >= 2 && text[at - 2] == '\r');
 }
 
 }  // namespace
@@ -211,14 +205,15 @@ std::string_view ArticleIndex::find(std::string_view title, std::size_t hash) co
 
 std::string_view ArticleIndex::LineKey::at(std::string_view text, std::size_t separator) {
     std::size_t start = separator;
-    while (!startsLine(text, start)) --start;
+    while (!catalogue::startsLine(text, start)) --start;
     return text.substr(start, separator - start);
 }
 
 // `title` (without a CR) stands before the separator from the start of its line, ignoring case.
 bool ArticleIndex::LineKey::holds(std::string_view text, std::size_t separator,
                                   std::string_view title) {
-    if (separator < title.size() || !startsLine(text, separator - title.size())) return false;
+    if (separator < title.size() || !catalogue::startsLine(text, separator - title.size()))
+        return false;
     const std::string_view there = text.substr(separator - title.size(), title.size());
     return sameTitle(there, title) || catalogue::equalsIgnoreCase(there, title);
 }
